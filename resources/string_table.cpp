@@ -7,7 +7,7 @@
 namespace resources {
 namespace {
 
-constexpr std::array<std::pair<int, std::string_view>, 18> kStrings = {{
+constexpr std::array<std::pair<int, std::string_view>, 23> kStrings = {{
     {kIdsModeRefused, "This operation can be performed only in Geometric , Render and Solid mode"},
     {16, "Geometric"},
     {17, "Wireframe"},
@@ -23,9 +23,14 @@ constexpr std::array<std::pair<int, std::string_view>, 18> kStrings = {{
     {kIdsCutByColor, "By Color"},
     {kIdsCutOff, "Off"},
     {kIdsCutWhole, "Whole"},
+    {kIdsFile, "File"},
+    {kIdsOf, "of"},
+    {kIdsStart, "Start"},
+    {kIdsDone, "Done"},
     {kIdsError, "Error"},
     {kIdsInfo, "Info"},
     {kIdsDefaultCamera, "Default"},
+    {kIdsCannotCreate2DFolder, "Cannot create 2D folder."},
 }};
 
 }  // namespace

@@ -11,9 +11,14 @@ enum StringId : int {
   kIdsCutByColor = 27,
   kIdsCutOff = 28,
   kIdsCutWhole = 29,
+  kIdsFile = 42,
+  kIdsOf = 43,
+  kIdsStart = 44,
+  kIdsDone = 45,
   kIdsError = 47,
   kIdsInfo = 49,
   kIdsDefaultCamera = 56,
+  kIdsCannotCreate2DFolder = 91,
 };
 
 // The text of a string id; empty for an id the table does not hold.

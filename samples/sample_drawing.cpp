@@ -1,16 +1,20 @@
 // Builds the sample drawing in code, so that it never goes stale against the file format.
 #include "samples/sample_drawing.h"
 
-#include <array>
-#include <string_view>
+#include "samples/sample_house.h"
+#include "shell/plugin_exports.h"
+#include "workbench/workbench.h"
 
 namespace samples {
 
 wb::Drawing MakeSampleDrawing() {
-  wb::Drawing drawing;
+  wb::Workbench& bench = wb::Workbench::Get();
+  bench.Reset();
+  bench.LoadPlugin({pandex::kExports.attach, pandex::kExports.detach, pandex::kExports.entry});
+  BuildSampleHouse();
+  wb::Drawing drawing = bench.CurrentDrawing();
   drawing.title = "sample";
-  constexpr std::array<std::string_view, 6> kLayerNames = {"Walls", "Slabs", "Roof", "Stairs", "Dimensions", "Texts"};
-  for (std::size_t i = 0; i < kLayerNames.size(); ++i) drawing.layers[i].name = kLayerNames[i];
+  bench.Reset();
   return drawing;
 }
 

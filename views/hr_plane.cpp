@@ -10,13 +10,12 @@
 #include "shell/host/argument_blocks.h"
 #include "shell/host/qeldll.h"
 #include "shell/host/qeldll_view.h"
+#include "views/cut_display.h"
 #include "views/section_symbols.h"
 
 namespace {
 
 constexpr const char* kPlaneClass = "HRPlane";
-constexpr const char* kPlaneCameraClass = "hrPlnCam";
-constexpr std::int16_t kRenderStillOn = -28;
 constexpr float kAxisLength = 100.0F;  // drawing units
 
 void Run(const char* command) { execute_internal_command(command); }
@@ -66,14 +65,6 @@ std::int16_t HRPlane::Create() { return CreateIn(GetCurrentDatabase()); }
 std::int16_t HRPlane::Load(host::EntityHandle entity) { return LoadFrom(GetCurrentDatabase(), entity); }
 std::int16_t HRPlane::Save() { return SaveTo(GetCurrentDatabase()); }
 
-void HRPlane::WriteCameraList(bool removeWhenEmpty) {
-  if (!cameras_.empty()) {
-    group_.SetLongVectorAttribute("@pln_cams=", static_cast<std::int32_t>(cameras_.size()), cameras_.data());
-  } else if (removeWhenEmpty) {
-    group_.RemoveAttribute("@pln_cams=");
-  }
-}
-
 void HRPlane::WriteRecord(bool removeEmptyCameraList) {
   const host::Point3f base = Narrow(base_);
   const host::Point3f dir = Narrow(dir_);
@@ -81,7 +72,7 @@ void HRPlane::WriteRecord(bool removeEmptyCameraList) {
   group_.SetFloatVectorAttribute("@dir=", &dir.x, 3);
   group_.SetStringAttribute("@name=", name_);
   group_.SetShortAttribute("@S2D=", static_cast<std::int16_t>(for2D_));
-  WriteCameraList(removeEmptyCameraList);
+  cameras_.WriteList(group_, removeEmptyCameraList);
 }
 
 std::int16_t HRPlane::CreateIn(host::DatabaseHandle database) {
@@ -105,28 +96,15 @@ std::int16_t HRPlane::LoadFrom(host::DatabaseHandle database, host::EntityHandle
   std::int16_t for2D = 0;
   group_.GetShortAttribute("@S2D=", for2D);
   for2D_ = static_cast<std::uint16_t>(for2D);
-  std::int32_t count = 0;
-  std::int32_t* list = nullptr;
-  cameras_.clear();
-  if (group_.ReadLongVectorAttribute("@pln_cams=", &count, &list) == 0 && list != nullptr && count > 0) {
-    cameras_.assign(list, list + count);
-  }
-  if (list != nullptr) log_free(list);
+  cameras_.ReadList(group_);
   if (group_.GetStringAttribute("@name=", name_) != 0) return model_status::kAttributeFailed;
   return 0;
 }
 
 std::int16_t HRPlane::Delete() {
   group_.Delete();
-  const host::DatabaseHandle database = GetCurrentDatabase();
-  for (const host::EntityHandle camera : cameras_) qel_delete_group(database, camera);
-  cameras_.clear();
+  cameras_.DeleteAll(GetCurrentDatabase());
   return 0;
-}
-
-host::EntityHandle HRPlane::CameraHandle(std::int32_t index) const {
-  if (index < 0 || static_cast<std::size_t>(index) >= cameras_.size()) return 0;
-  return cameras_[static_cast<std::size_t>(index)];
 }
 
 std::int16_t HRPlane::ShowView(std::int32_t cameraIndex, const void* /*context*/) {
@@ -135,7 +113,7 @@ std::int16_t HRPlane::ShowView(std::int32_t cameraIndex, const void* /*context*/
   if (withCamera) {
     // Applying a camera that did not load would switch every layer off and put the eye on the
     // target; the view is left as it is instead.
-    if (const std::int16_t loaded = camera.Load(CameraHandle(cameraIndex)); loaded != 0) return loaded;
+    if (const std::int16_t loaded = cameras_.Load(cameraIndex, camera); loaded != 0) return loaded;
     camera.ApplyView(0);
   }
   const host::Point3f base = Narrow(base_);
@@ -144,32 +122,16 @@ std::int16_t HRPlane::ShowView(std::int32_t cameraIndex, const void* /*context*/
   globp[2] = {base.x, base.y + kAxisLength, base.z};
   globp[3] = Narrow(dir_);
 
-  Run("inq_render_mode");
-  if (globr[0] == 1.0F) {
+  if (cut_display::RenderingActive()) {
     // The camera's first phase turned the wait cursor on; do not leave it on when refusing.
     if (withCamera) remove_wait_cur();
-    return kRenderStillOn;
+    return cut_display::kRenderStillOn;
   }
-  globc[109] = cutType_;
-  globc[243] = 's';
-  globp[25].y = 7.0F;
-  if (globc[26] != 's') {
-    globc[26] = 's';
-    Run("set_background_color");
-    globr[0] = 0.0F;
-    Run("wire_frame_all");
-  }
-  globc[0] = 'b';
-  Run("set_dspmode_info");
+  cut_display::Begin(cutType_);
+  // Texts of the plan show while the section symbols do.
   globr[0] = SectionsShown != 0 ? 1.0F : globr[103];
   Run("draw_text_on_off");
-  globc[27] = 'f';
-  Run("new_solid");
-  Run("redraw_all");
-  if (globc[0] != 'h') {
-    globc[0] = 'h';
-    Run("set_dspmode_info");
-  }
+  cut_display::Finish('h');
   if (withCamera) {
     camera.ApplyView(1);
   } else {
@@ -179,59 +141,15 @@ std::int16_t HRPlane::ShowView(std::int32_t cameraIndex, const void* /*context*/
   return 0;
 }
 
-std::int32_t HRPlane::AddCamera(const std::string& name) {
-  HRCamera camera;
-  const std::int16_t captured = camera.CaptureView();
-  camera.SetName(name);
-  camera.SetClassName(kPlaneCameraClass);
-  if (captured != 0 || camera.Create() != 0) return 0;
-  const auto index = static_cast<std::int32_t>(cameras_.size());
-  cameras_.push_back(camera.GetHandle());
-  WriteCameraList(false);
-  return index;
-}
-
-std::int16_t HRPlane::LoadCamera(std::int32_t index, HRCamera& camera) { return camera.Load(CameraHandle(index)); }
-
-std::int16_t HRPlane::RemoveCamera(std::int32_t index) {
-  if (index < 0 || static_cast<std::size_t>(index) >= cameras_.size()) return model_status::kHeaderNotRead;
-  HRCamera camera;
-  const std::int16_t loaded = camera.Load(cameras_[static_cast<std::size_t>(index)]);
-  cameras_.erase(cameras_.begin() + index);
-  WriteCameraList(true);
-  return loaded == 0 ? camera.Delete() : loaded;
-}
-
-std::int16_t HRPlane::GetCameraCount() const { return static_cast<std::int16_t>(cameras_.size()); }
-
-std::string HRPlane::GetCameraName(std::int32_t index) {
-  HRCamera camera;
-  return camera.Load(CameraHandle(index)) == 0 ? camera.GetName() : std::string();
-}
-
-void HRPlane::RenameCamera(const std::string& name, std::int32_t index) {
-  HRCamera camera;
-  if (camera.Load(CameraHandle(index)) != 0) return;
-  camera.SetName(name);
-  camera.Save();
-}
-
-void HRPlane::SetCameraFor2D(std::int32_t index, std::int16_t for2D) {
-  HRCamera camera;
-  if (camera.Load(CameraHandle(index)) != 0) return;
-  camera.SetFor2D(for2D);
-  camera.Save();
-}
-
-std::uint16_t HRPlane::IsCameraFor2D(std::int32_t index) {
-  HRCamera camera;
-  return camera.Load(CameraHandle(index)) == 0 ? camera.IsFor2D() : 0;
-}
-
-std::int16_t HRPlane::SaveCamera(std::int32_t index, HRCamera& camera) {
-  camera.SetHandle(CameraHandle(index));
-  return camera.SaveTo(GetCurrentDatabase());
-}
+std::int32_t HRPlane::AddCamera(const std::string& name) { return cameras_.Add(group_, name); }
+std::int16_t HRPlane::LoadCamera(std::int32_t index, HRCamera& camera) { return cameras_.Load(index, camera); }
+std::int16_t HRPlane::RemoveCamera(std::int32_t index) { return cameras_.Remove(group_, index); }
+std::int16_t HRPlane::GetCameraCount() const { return cameras_.Count(); }
+std::string HRPlane::GetCameraName(std::int32_t index) { return cameras_.NameAt(index); }
+void HRPlane::RenameCamera(const std::string& name, std::int32_t index) { cameras_.Rename(index, name); }
+void HRPlane::SetCameraFor2D(std::int32_t index, std::int16_t for2D) { cameras_.SetFor2D(index, for2D); }
+std::uint16_t HRPlane::IsCameraFor2D(std::int32_t index) { return cameras_.IsFor2D(index); }
+std::int16_t HRPlane::SaveCamera(std::int32_t index, HRCamera& camera) { return cameras_.Save(index, camera); }
 
 bool IsPlaneEntity(host::DatabaseHandle database, host::EntityHandle entity) {
   return HasClassMarker(database, entity, kPlaneClass);

@@ -9,6 +9,7 @@
 #include "model/hr_group.h"
 #include "model/hr_object.h"
 #include "views/hr_camera.h"
+#include "views/owned_cameras.h"
 
 class HRPlane : public HRObject {
  public:
@@ -46,12 +47,10 @@ class HRPlane : public HRObject {
   const double* GetBase() const { return base_; }
   const double* GetDir() const { return dir_; }
   char GetCutType() const { return cutType_; }
-  const std::vector<host::EntityHandle>& Cameras() const { return cameras_; }
+  const std::vector<host::EntityHandle>& Cameras() const { return cameras_.Handles(); }
 
  private:
   void WriteRecord(bool removeEmptyCameraList);
-  void WriteCameraList(bool removeWhenEmpty);
-  host::EntityHandle CameraHandle(std::int32_t index) const;
 
   HRGroup group_;
   std::string name_;
@@ -59,7 +58,7 @@ class HRPlane : public HRObject {
   double dir_[3] = {0.0, 0.0, 0.0};
   char cutType_ = 'b';
   std::uint16_t for2D_ = 0;
-  std::vector<host::EntityHandle> cameras_;
+  OwnedCameras cameras_{"hrPlnCam", "@pln_cams="};
 };
 
 // True when the entity's "@Class=" is exactly "HRPlane".

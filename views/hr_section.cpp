@@ -112,14 +112,6 @@ void HRSection::WriteMarkRoles() const {
   WriteExactString(endMark_, "@dim_typ", "end");
 }
 
-void HRSection::WriteCameraList() const {
-  if (cameras_.empty()) {
-    instance_.RemoveAttribute("@CamLst=");
-  } else {
-    instance_.SetLongVectorAttribute("@CamLst=", static_cast<std::int32_t>(cameras_.size()), cameras_.data());
-  }
-}
-
 std::int16_t HRSection::CreateIn(host::DatabaseHandle database) {
   startLabel_.LoadTextDefaults();
   endLabel_.LoadTextDefaults();
@@ -139,7 +131,7 @@ std::int16_t HRSection::CreateIn(host::DatabaseHandle database) {
   instance_.SetStringAttribute("@sec=", "0");
   instance_.SetShortAttribute("@S2D=", static_cast<std::int16_t>(for2D_));
   instance_.SetStringAttribute("@type=", std::string(1, cutType_));
-  if (!cameras_.empty()) WriteCameraList();
+  cameras_.WriteList(instance_, false);
   write_to_record(instance_.GetEntity(), 1);
   write_to_record(-1, -1);
   return 0;
@@ -155,7 +147,7 @@ std::int16_t HRSection::SaveTo(host::DatabaseHandle database) {
   endLabel_.Update();
   WriteMarkRoles();
   instance_.SetBlock(block_);
-  WriteCameraList();
+  cameras_.WriteList(instance_, true);
   // Any "selected" value is stored as 1; only creation keeps the value as given.
   instance_.SetShortAttribute("@S2D=", for2D_ != 0 ? 1 : 0);
   instance_.SetStringAttribute("@type=", std::string(1, cutType_));
@@ -178,19 +170,14 @@ std::int16_t HRSection::LoadFrom(host::DatabaseHandle database, host::EntityHand
   startLabel_.Read(database, block_.GetMember(3));
   endLabel_.Read(database, block_.GetMember(4));
 
-  std::int32_t count = 0;
-  std::int32_t* list = nullptr;
-  instance_.ReadLongVectorAttribute("@CamLst=", &count, &list);
+  cameras_.ReadList(instance_);
   std::int16_t for2D = 0;
   instance_.GetShortAttribute("@S2D=", for2D);
   for2D_ = static_cast<std::uint16_t>(for2D);
-  cameras_.clear();
-  if (list != nullptr && count > 0) cameras_.assign(list, list + count);
 
   std::string type;
   instance_.GetStringAttribute("@type=", type);
   cutType_ = type.empty() ? '\0' : type.front();
-  if (list != nullptr) log_free(list);
   return 0;
 }
 
@@ -202,13 +189,7 @@ std::int16_t HRSection::Delete() {
   instance_.Delete();
   block_.DeleteAllMembers();
   block_.Delete();
-  const host::DatabaseHandle database = GetCurrentDatabase();
-  for (const host::EntityHandle camera : cameras_) {
-    HRCamera owned;
-    owned.SetHandle(camera);
-    owned.DeleteIn(database);
-  }
-  cameras_.clear();
+  cameras_.DeleteAll(GetCurrentDatabase());
   return 0;
 }
 

@@ -16,6 +16,7 @@
 #include "model/hr_point.h"
 #include "model/hr_text.h"
 #include "views/hr_camera.h"
+#include "views/owned_cameras.h"
 #include "views/section_settings.h"
 
 class HRSection : public HRObject {
@@ -68,7 +69,7 @@ class HRSection : public HRObject {
   void SetSettings(const SectionSettings& settings);
 
   char GetCutType() const { return cutType_; }
-  const std::vector<host::EntityHandle>& Cameras() const { return cameras_; }
+  const std::vector<host::EntityHandle>& Cameras() const { return cameras_.Handles(); }
 
  private:
   // Lays out line, marks, labels and the instance's placement for a cut from start to end.
@@ -76,8 +77,6 @@ class HRSection : public HRObject {
   // The line's two ends in drawing coordinates.
   void CutLine(HRMath::Vector& start, HRMath::Vector& end) const;
   void WriteMarkRoles() const;
-  void WriteCameraList() const;
-  host::EntityHandle CameraHandle(std::int32_t index) const;
 
   HRPlacedBlock instance_;
   HRBlock block_;
@@ -89,5 +88,5 @@ class HRSection : public HRObject {
   float labelOffset_ = 0.3F;
   std::uint16_t for2D_ = 0;
   char cutType_ = kCutByColor;
-  std::vector<host::EntityHandle> cameras_;
+  OwnedCameras cameras_{"hrSecCam", "@CamLst="};
 };

@@ -32,7 +32,8 @@ enum EntityType : std::uint8_t {
 };
 
 // The host's 18-byte entity header. The plug-in uses bytes 8 to 11; the host keeps the
-// layer index in byte 12 and the colour in byte 13.
+// layer index in byte 12, the colour in byte 13, and the two category codes and the flag byte
+// its database loop reports in bytes 14, 15 and 16.
 struct EntityHeader {
   std::uint8_t bytes[18];
 };
@@ -42,6 +43,9 @@ constexpr std::size_t kHeaderFlags = 10;
 constexpr std::size_t kHeaderType = 11;
 constexpr std::size_t kHeaderLayer = 12;
 constexpr std::size_t kHeaderColor = 13;
+constexpr std::size_t kHeaderCategoryCode = 14;  // reported as byte 1 by the database loop
+constexpr std::size_t kHeaderCategoryKind = 15;  // reported as byte 3
+constexpr std::size_t kHeaderLoopFlags = 16;     // reported as byte 2
 constexpr std::uint8_t kFlagHidden = 0x80;
 
 struct Point3f {

@@ -8,7 +8,6 @@
 #include "shell/host/qeldll.h"
 #include "shell/host/qeldll_view.h"
 #include "tests/views/views_fixture.h"
-#include "views/hr_section.h"
 #include "views/section_symbols.h"
 
 namespace {
@@ -224,13 +223,7 @@ TEST_F(CameraViewTest, RefusedLayerSwitchStopsExecuteWithTheCursorRemoved) {
 }
 
 TEST_F(CameraViewTest, ExecuteShowsOrHidesEverySectionSymbol) {
-  HRSection section;
-  SectionSettings sectionSettings;
-  sectionSettings.end[0] = 5.0F;
-  section.SetName("A");
-  section.SetSettings(sectionSettings);
-  ASSERT_EQ(section.Create(), 0);
-  const host::EntityHandle instance = section.GetHandle();
+  const host::EntityHandle instance = StoreSection();
 
   CameraSettings settings = ApplicableSettings(HRUtility::kGeometric, HRCamera::k3DParallel);
   settings.showSections = 0;
@@ -274,13 +267,8 @@ TEST_F(CameraViewTest, ApplyViewFinishesInTheCamerasOwnMode) {
 }
 
 TEST_F(CameraViewTest, ApplyViewNeverShowsSymbolsItself) {
-  HRSection section;
-  SectionSettings sectionSettings;
-  sectionSettings.end[0] = 5.0F;
-  section.SetName("A");
-  section.SetSettings(sectionSettings);
-  ASSERT_EQ(section.Create(), 0);
-  ASSERT_EQ(section.HideSymbol(), 0);
+  const host::EntityHandle instance = StoreSection();
+  Find(instance)->header.bytes[host::kHeaderFlags] |= host::kFlagHidden;
 
   CameraSettings settings = ApplicableSettings(HRUtility::kGeometric, HRCamera::k3DParallel);
   settings.showSections = 1;
@@ -288,15 +276,15 @@ TEST_F(CameraViewTest, ApplyViewNeverShowsSymbolsItself) {
   showing.ApplyView(0);
   showing.ApplyView(1);
   EXPECT_EQ(SectionsShown, 1);
-  EXPECT_TRUE(Find(section.GetHandle())->Hidden());
+  EXPECT_TRUE(Find(instance)->Hidden());
 
-  ASSERT_EQ(section.ShowSymbol(), 0);
+  Find(instance)->header.bytes[host::kHeaderFlags] &= static_cast<std::uint8_t>(~host::kFlagHidden);
   settings.showSections = 0;
   HRCamera hiding = CameraWith(settings);
   hiding.ApplyView(0);
   hiding.ApplyView(1);
   EXPECT_EQ(SectionsShown, 1);  // phase 0 hides without changing the flag
-  EXPECT_TRUE(Find(section.GetHandle())->Hidden());
+  EXPECT_TRUE(Find(instance)->Hidden());
 }
 
 class CameraRoundTripTest : public CameraViewTest, public ::testing::WithParamInterface<std::int16_t> {};

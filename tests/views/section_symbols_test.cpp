@@ -4,7 +4,8 @@
 #include <vector>
 
 #include "tests/views/views_fixture.h"
-#include "views/hr_section.h"
+#include "views/hr_plane.h"
+#include "views/hr_selection.h"
 #include "views/section_symbols.h"
 #include "views/view_collection.h"
 
@@ -12,23 +13,12 @@ namespace {
 
 class SectionSymbolsTest : public ViewsTest {
  protected:
-  static host::EntityHandle MakeSection(const std::string& name) {
-    HRSection section;
-    SectionSettings settings;
-    settings.end[1] = 5.0F;
-    settings.symbolFile = "...sec_sym\\sec02";
-    section.SetName(name);
-    section.SetSettings(settings);
-    EXPECT_EQ(section.Create(), 0);
-    return section.GetHandle();
-  }
-
   static std::uint8_t& Flags(host::EntityHandle entity) { return Find(entity)->header.bytes[host::kHeaderFlags]; }
   static bool Hidden(host::EntityHandle entity) { return Find(entity)->Hidden(); }
 };
 
 TEST_F(SectionSymbolsTest, SectionTestIsExactAndCaseSensitive) {
-  const host::EntityHandle section = MakeSection("A");
+  const host::EntityHandle section = StoreSection("A");
   const host::DatabaseHandle database = Bench().Current();
   EXPECT_TRUE(IsSection(database, section));
   for (const char* near : {"hrsection", "HRSection ", "HRCamera", "hrSecCam", "HRSectio", " HRSection"}) {
@@ -57,9 +47,9 @@ TEST_F(SectionSymbolsTest, DrawingWithoutSectionsIsLeftAlone) {
 }
 
 TEST_F(SectionSymbolsTest, HideReachesVisibleSectionsOnly) {
-  const host::EntityHandle first = MakeSection("A");
-  const host::EntityHandle alreadyHidden = MakeSection("B");
-  const host::EntityHandle third = MakeSection("C");
+  const host::EntityHandle first = StoreSection("A");
+  const host::EntityHandle alreadyHidden = StoreSection("B");
+  const host::EntityHandle third = StoreSection("C");
   Flags(alreadyHidden) |= host::kFlagHidden;
   ClearJournal();
   HideSectionSymbols();
@@ -70,8 +60,8 @@ TEST_F(SectionSymbolsTest, HideReachesVisibleSectionsOnly) {
 }
 
 TEST_F(SectionSymbolsTest, ShowReachesEverySectionHiddenOrNot) {
-  const host::EntityHandle visible = MakeSection("A");
-  const host::EntityHandle hidden = MakeSection("B");
+  const host::EntityHandle visible = StoreSection("A");
+  const host::EntityHandle hidden = StoreSection("B");
   Flags(hidden) |= host::kFlagHidden;
   ClearJournal();
   ShowSectionSymbols();
@@ -81,7 +71,7 @@ TEST_F(SectionSymbolsTest, ShowReachesEverySectionHiddenOrNot) {
 }
 
 TEST_F(SectionSymbolsTest, HidingAndShowingKeepsTheOtherFlagBits) {
-  const host::EntityHandle section = MakeSection("A");
+  const host::EntityHandle section = StoreSection("A");
   Flags(section) = 0x5A;
   HideSectionSymbols();
   EXPECT_EQ(Flags(section), 0xDA);
@@ -90,7 +80,7 @@ TEST_F(SectionSymbolsTest, HidingAndShowingKeepsTheOtherFlagBits) {
 }
 
 TEST_F(SectionSymbolsTest, SymbolsOfOtherEntitiesAndMembersStayAsTheyAre) {
-  const host::EntityHandle section = MakeSection("A");
+  const host::EntityHandle section = StoreSection("A");
   const host::EntityHandle block = wb::ReadRecord<host::PlacedBlockRecord>(*Find(section)).block;
   const host::EntityHandle line = Find(block)->members[0];
   HideSectionSymbols();
@@ -100,8 +90,8 @@ TEST_F(SectionSymbolsTest, SymbolsOfOtherEntitiesAndMembersStayAsTheyAre) {
 }
 
 TEST_F(SectionSymbolsTest, UnreadableSectionIsSkippedAndTheWalkGoesOn) {
-  const host::EntityHandle first = MakeSection("A");
-  const host::EntityHandle second = MakeSection("B");
+  const host::EntityHandle first = StoreSection("A");
+  const host::EntityHandle second = StoreSection("B");
   FailForEntity("qel_read_entity_header", first);
   HideSectionSymbols();
   EXPECT_FALSE(Hidden(first));
@@ -110,7 +100,7 @@ TEST_F(SectionSymbolsTest, UnreadableSectionIsSkippedAndTheWalkGoesOn) {
 
 TEST_F(SectionSymbolsTest, FlagStartsOffAndOnlyCameraApplicationWritesIt) {
   EXPECT_EQ(SectionsShown, 0);
-  MakeSection("A");
+  StoreSection("A");
   ShowSectionSymbols();
   EXPECT_EQ(SectionsShown, 0);
   SectionsShown = 1;
@@ -123,13 +113,22 @@ TEST_F(SectionSymbolsTest, FlagStartsOffAndOnlyCameraApplicationWritesIt) {
 }
 
 TEST_F(SectionSymbolsTest, CollectionsFindEveryViewOfItsClassHiddenOnesIncluded) {
-  const host::EntityHandle first = MakeSection("A");
-  const host::EntityHandle hidden = MakeSection("B");
+  const host::EntityHandle first = StoreSection("A");
+  const host::EntityHandle hidden = StoreSection("B");
   Flags(hidden) |= host::kFlagHidden;
-  StoreCamera("Not a section");
+  StoreCamera("Not a view");
+  HRPlane plan;
+  const double base[3] = {0, 0, 0};
+  plan.Define("P", base, base);
+  ASSERT_EQ(plan.Create(), 0);
+  Flags(plan.GetHandle()) |= host::kFlagHidden;
+  HRSelection selection;
+  selection.SetName("S");
+  ASSERT_EQ(selection.Create(), 0);
+
   EXPECT_EQ(CollectSectionHandles(Bench().Current()), (std::vector<host::EntityHandle>{first, hidden}));
-  EXPECT_TRUE(CollectPlanHandles(Bench().Current()).empty());
-  EXPECT_TRUE(CollectSelectionHandles().empty());
+  EXPECT_EQ(CollectPlanHandles(Bench().Current()), std::vector<host::EntityHandle>{plan.GetHandle()});
+  EXPECT_EQ(CollectSelectionHandles(), std::vector<host::EntityHandle>{selection.GetHandle()});
 }
 
 }  // namespace

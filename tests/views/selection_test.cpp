@@ -49,12 +49,7 @@ class SelectionTest : public ViewsTest {
   // A section with the given number of cameras, all ticked.
   static host::EntityHandle SectionWithCameras(int cameras) {
     HRSection section;
-    SectionSettings settings;
-    settings.end[0] = 10.0F;
-    settings.symbolFile = "...sec_sym\\sec01";
-    section.SetName("S");
-    section.SetSettings(settings);
-    EXPECT_EQ(section.Create(), 0);
+    StoreSection("S", &section);
     for (int k = 0; k < cameras; ++k) {
       section.AddCamera("Camera " + std::to_string(k));
       section.SetCameraFor2D(k, 1);

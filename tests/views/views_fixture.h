@@ -16,6 +16,7 @@
 #include "views/camera_settings.h"
 #include "views/hr_camera.h"
 #include "views/hr_camera_mgr.h"
+#include "views/hr_section.h"
 #include "workbench/drawing_file.h"
 #include "workbench/workbench.h"
 
@@ -212,6 +213,19 @@ class ViewsTest : public ::testing::Test {
     camera.SetClassName(className);
     EXPECT_EQ(camera.Create(), 0);
     return camera.GetHandle();
+  }
+
+  // A stored section five units long along x, made as the pane makes one; answers its handle.
+  static host::EntityHandle StoreSection(const std::string& name = "A", HRSection* keep = nullptr) {
+    HRSection local;
+    HRSection& section = keep != nullptr ? *keep : local;
+    SectionSettings settings;
+    settings.end[0] = 5.0F;
+    settings.symbolFile = "...sec_sym\\sec01";
+    section.SetName(name);
+    section.SetSettings(settings);
+    EXPECT_EQ(section.Create(), 0);
+    return section.GetHandle();
   }
 
  private:
