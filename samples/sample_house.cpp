@@ -107,10 +107,10 @@ void AddSlabsAndRoof() {
 void AddStairs() {
   constexpr int kSteps = 15;
   const float rise = kStorey / kSteps;
-  const float going = 4.5F / kSteps;
+  const float going = 3.3F / kSteps;
   for (int i = 0; i < kSteps; ++i) {
     const auto step = static_cast<float>(i);
-    AddSolid(Block(6.5F + step * going, kDepth - 2.8F, 0.0F, going, 1.0F, rise * (step + 1.0F)), kStairs, 3,
+    AddSolid(Block(6.3F + step * going, kDepth - 2.8F, 0.0F, going, 1.0F, rise * (step + 1.0F)), kStairs, 3,
              kNoCategory);
   }
 }

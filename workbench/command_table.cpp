@@ -28,12 +28,12 @@ std::optional<host::Status> Run(const CommandMap& map, std::string_view name) {
 }  // namespace
 
 std::optional<host::Status> RunHostCommand(std::string_view name) {
-  static const CommandMap commands = BuildMap({ViewCommands(), DisplayCommands()});
+  static const CommandMap commands = BuildMap({ViewCommands(), DisplayCommands(), Output2DCommands()});
   return Run(commands, name);
 }
 
 std::optional<host::Status> RunHostOverlay(std::string_view name) {
-  static const CommandMap overlays = BuildMap({DisplayOverlays()});
+  static const CommandMap overlays = BuildMap({DisplayOverlays(), Output2DOverlays()});
   return Run(overlays, name);
 }
 

@@ -21,6 +21,13 @@ struct NamedCommand {
 std::span<const NamedCommand> ViewCommands();
 std::span<const NamedCommand> DisplayCommands();
 std::span<const NamedCommand> DisplayOverlays();
+std::span<const NamedCommand> Output2DCommands();
+std::span<const NamedCommand> Output2DOverlays();
+
+// A solid build that carries a section or plan cut (globc[243] 's', the cut's points in
+// globp[0..3]) makes that cut the view's; back in plain geometry no cut is shown.
+void TakeCutFromSolidBuild();
+void DropCuts();
 
 // The result of the named command or overlay; nullopt when the host has none of that name.
 std::optional<host::Status> RunHostCommand(std::string_view name);

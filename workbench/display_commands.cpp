@@ -91,6 +91,8 @@ host::Status ShadowedPaleSurfaces() { return DrawSolidAs('O'); }
 
 host::Status AllEdgesAsWires() {
   ++Display().allWireResets;
+  // Back in plain geometry the model is shown whole again.
+  if (globc[letter::kSolidState] == 'w') DropCuts();
   return host::kOk;
 }
 
@@ -98,6 +100,8 @@ host::Status NewSolid() {
   DisplayState& display = Display();
   ++display.solidBuilds;
   if (globc[letter::kSolidRebuild] == 'f') ++display.freshSolidBuilds;
+  // A section or plan view hands its cut over with the solid build (globc[243] 's').
+  TakeCutFromSolidBuild();
   return host::kOk;
 }
 

@@ -6,6 +6,10 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <sqlite3.h>
+
+#include <algorithm>
+#include <array>
 #include <cerrno>
 #include <cstring>
 #include <memory>
@@ -40,50 +44,60 @@ std::string Message(Reason reason, const std::string& path, const std::string& d
 
 std::string ErrorText(int error) { return std::generic_category().message(error); }
 
-// The file's bytes in memory SQLite can take over, so the database is read without SQLite ever
-// opening the file: no lock, journal or any other side file, and the file cannot change.
 struct SqliteFree {
   void operator()(unsigned char* bytes) const { sqlite3_free(bytes); }
 };
-struct FileBytes {
-  std::unique_ptr<unsigned char[], SqliteFree> bytes;
-  std::size_t size = 0;
-};
+using SqliteBytes = std::unique_ptr<unsigned char[], SqliteFree>;
 
-class FileDescriptor {
+// A regular file open for reading; anything else in its place is refused.
+class OpenedFile {
  public:
-  explicit FileDescriptor(int fd) : fd_(fd) {}
-  ~FileDescriptor() { close(fd_); }
-  FileDescriptor(const FileDescriptor&) = delete;
-  FileDescriptor& operator=(const FileDescriptor&) = delete;
-  int Get() const { return fd_; }
+  explicit OpenedFile(const std::filesystem::path& path)
+      // Non-blocking, so that a named pipe in the file's place is refused rather than waited on.
+      : path_(path), fd_(open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC)) {
+    if (fd_ < 0) Refuse(Reason::CannotRead, path, ErrorText(errno));
+    struct stat status {};
+    const bool known = fstat(fd_, &status) == 0;
+    const int error = errno;
+    if (!known || !S_ISREG(status.st_mode)) {
+      close(fd_);
+      if (!known) Refuse(Reason::CannotRead, path, ErrorText(error));
+      Refuse(Reason::CannotRead, path, S_ISDIR(status.st_mode) ? "it is a folder" : "it is not a regular file");
+    }
+    size_ = static_cast<std::size_t>(status.st_size);
+  }
+  ~OpenedFile() { close(fd_); }
+  OpenedFile(const OpenedFile&) = delete;
+  OpenedFile& operator=(const OpenedFile&) = delete;
+
+  std::size_t Size() const { return size_; }
+
+  // Reads `count` bytes from the start; refuses a file that has become shorter meanwhile.
+  void ReadStart(unsigned char* bytes, std::size_t count) const {
+    std::size_t done = 0;
+    while (done < count) {
+      const ssize_t got = pread(fd_, bytes + done, count - done, static_cast<off_t>(done));
+      if (got < 0 && errno == EINTR) continue;
+      if (got < 0) Refuse(Reason::CannotRead, path_, ErrorText(errno));
+      if (got == 0) Refuse(Reason::CannotRead, path_, "it changed while it was read");
+      done += static_cast<std::size_t>(got);
+    }
+  }
+
+  // The whole file in memory that SQLite can take over, so the database is read without SQLite
+  // ever opening the file: no lock, journal or other side file, and nothing is written to it.
+  SqliteBytes ReadAll() const {
+    SqliteBytes bytes(static_cast<unsigned char*>(sqlite3_malloc64(size_)));
+    if (!bytes) Refuse(Reason::CannotRead, path_, "not enough memory");
+    ReadStart(bytes.get(), size_);
+    return bytes;
+  }
 
  private:
+  const std::filesystem::path& path_;
   int fd_;
+  std::size_t size_ = 0;
 };
-
-FileBytes ReadWholeFile(const std::filesystem::path& path) {
-  // Non-blocking, so that a named pipe in the file's place is refused rather than waited on.
-  const int fd = open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
-  if (fd < 0) Refuse(Reason::CannotRead, path, ErrorText(errno));
-  const FileDescriptor file(fd);
-  struct stat status {};
-  if (fstat(file.Get(), &status) != 0) Refuse(Reason::CannotRead, path, ErrorText(errno));
-  if (S_ISDIR(status.st_mode)) Refuse(Reason::CannotRead, path, "it is a folder");
-  if (!S_ISREG(status.st_mode)) Refuse(Reason::CannotRead, path, "it is not a regular file");
-  const auto size = static_cast<std::size_t>(status.st_size);
-  FileBytes content;
-  content.bytes.reset(static_cast<unsigned char*>(sqlite3_malloc64(std::max<std::size_t>(size, 1))));
-  if (!content.bytes) Refuse(Reason::CannotRead, path, "not enough memory");
-  while (content.size < size) {
-    const ssize_t got = read(file.Get(), content.bytes.get() + content.size, size - content.size);
-    if (got < 0 && errno == EINTR) continue;
-    if (got < 0) Refuse(Reason::CannotRead, path, ErrorText(errno));
-    if (got == 0) break;  // the file shrank meanwhile; the checks below see what is there
-    content.size += static_cast<std::size_t>(got);
-  }
-  return content;
-}
 
 std::uint32_t BigEndian(const unsigned char* bytes, std::size_t offset, std::size_t width) {
   std::uint32_t value = 0;
@@ -91,21 +105,23 @@ std::uint32_t BigEndian(const unsigned char* bytes, std::size_t offset, std::siz
   return value;
 }
 
-// The SQLite file header, checked before SQLite sees the file, so that foreign files and files
-// from newer versions get their own message, and a cut-off file is named as such.
-void CheckFileHeader(const FileBytes& file, const std::filesystem::path& path) {
+// The SQLite file header, checked before the rest is read and before SQLite sees the file, so
+// that a foreign file is never read whole, foreign files and files from newer versions get their
+// own message, and a cut-off file is named as such.
+void CheckFileHeader(const OpenedFile& file, const std::filesystem::path& path) {
   static constexpr char kMagic[] = "SQLite format 3";  // 16 bytes with the terminating zero
-  constexpr std::size_t kHeaderSize = 100;
-  const unsigned char* header = file.bytes.get();
-  if (file.size == 0) Refuse(Reason::NotADrawing, path, "the file is empty");
-  if (file.size < sizeof kMagic || std::memcmp(header, kMagic, sizeof kMagic) != 0) {
+  std::array<unsigned char, 100> header{};
+  const std::size_t size = file.Size();
+  if (size == 0) Refuse(Reason::NotADrawing, path, "the file is empty");
+  file.ReadStart(header.data(), std::min(size, header.size()));
+  if (size < sizeof kMagic || std::memcmp(header.data(), kMagic, sizeof kMagic) != 0) {
     Refuse(Reason::NotADrawing, path, "");
   }
-  if (file.size < kHeaderSize) Refuse(Reason::Damaged, path, "it is cut off in its header");
-  if (BigEndian(header, 68, 4) != drawing_file::kApplicationId) {
+  if (size < header.size()) Refuse(Reason::Damaged, path, "it is cut off in its header");
+  if (BigEndian(header.data(), 68, 4) != drawing_file::kApplicationId) {
     Refuse(Reason::NotADrawing, path, "a database of another program");
   }
-  const std::uint32_t format = BigEndian(header, 60, 4);
+  const std::uint32_t format = BigEndian(header.data(), 60, 4);
   if (format > drawing_file::kFormatVersion) {
     Refuse(Reason::NewerVersion, path,
            "format " + std::to_string(format) + "; this version reads format " +
@@ -114,18 +130,18 @@ void CheckFileHeader(const FileBytes& file, const std::filesystem::path& path) {
   if (format != drawing_file::kFormatVersion) Refuse(Reason::Damaged, path, "unknown format " + std::to_string(format));
   // Drawing files never use a write-ahead log and always store UTF-8; read as it stands, a
   // header saying otherwise would make SQLite look for side files or convert the texts.
-  const std::uint32_t pageSizeField = BigEndian(header, 16, 2);
+  const std::uint32_t pageSizeField = BigEndian(header.data(), 16, 2);
   const std::size_t pageSize = pageSizeField == 1 ? 65536 : pageSizeField;
-  if (header[18] != 1 || header[19] != 1 || BigEndian(header, 56, 4) != 1 || pageSize < 512 ||
+  if (header[18] != 1 || header[19] != 1 || BigEndian(header.data(), 56, 4) != 1 || pageSize < 512 ||
       (pageSize & (pageSize - 1)) != 0) {
     Refuse(Reason::Damaged, path, "its header is damaged");
   }
-  const std::size_t expectedSize = pageSize * BigEndian(header, 28, 4);
-  if (file.size < expectedSize) {
+  const std::size_t expectedSize = pageSize * BigEndian(header.data(), 28, 4);
+  if (size < expectedSize) {
     Refuse(Reason::Damaged, path,
-           "it is cut off after " + std::to_string(file.size) + " of " + std::to_string(expectedSize) + " bytes");
+           "it is cut off after " + std::to_string(size) + " of " + std::to_string(expectedSize) + " bytes");
   }
-  if (file.size != expectedSize) Refuse(Reason::Damaged, path, "its size does not match its header");
+  if (size != expectedSize) Refuse(Reason::Damaged, path, "its size does not match its header");
 }
 
 }  // namespace
@@ -139,25 +155,20 @@ void SaveDrawingFile(const Drawing& drawing, const std::filesystem::path& path) 
     drawing_file::FileReplacement replacement(path);
     drawing_file::WriteDrawingDatabase(drawing, replacement.TemporaryPath());
     replacement.Commit();
-  } catch (const std::system_error& error) {
-    Refuse(Reason::CannotWrite, path, error.what());
-  } catch (const drawing_file::SqliteError& error) {
-    Refuse(Reason::CannotWrite, path, error.what());
-  } catch (const drawing_file::BadContent& error) {
+  } catch (const std::runtime_error& error) {  // system, SQLite and content errors alike
     Refuse(Reason::CannotWrite, path, error.what());
   }
 }
 
 Drawing OpenDrawingFile(const std::filesystem::path& path) {
-  FileBytes file = ReadWholeFile(path);
+  const OpenedFile file(path);
   CheckFileHeader(file, path);
+  SqliteBytes bytes = file.ReadAll();
   try {
     drawing_file::Connection database;
-    database.Deserialize(file.bytes.release(), file.size);
-    return drawing_file::ReadDrawingDatabase(database, file.size);
-  } catch (const drawing_file::SqliteError& error) {
-    Refuse(Reason::Damaged, path, error.what());
-  } catch (const drawing_file::BadContent& error) {
+    database.Deserialize(bytes.release(), file.Size());
+    return drawing_file::ReadDrawingDatabase(database, file.Size());
+  } catch (const std::runtime_error& error) {  // SQLite and content errors alike
     Refuse(Reason::Damaged, path, error.what());
   }
 }

@@ -35,7 +35,8 @@ host::EntityHandle Contained(const Entity& entity, std::size_t index) {
 
 std::string Named(const Entity& entity) { return "entity " + std::to_string(entity.handle); }
 
-std::optional<std::string> FindBadSlot(const Drawing& drawing) {
+// Also collects the slots that contain other entities, the only ones a cycle can pass through.
+std::optional<std::string> FindBadSlot(const Drawing& drawing, std::vector<std::size_t>& containers) {
   const auto count = static_cast<host::EntityHandle>(drawing.slots.size());
   for (std::size_t i = 0; i < drawing.slots.size(); ++i) {
     const Entity& entity = drawing.slots[i];
@@ -57,13 +58,14 @@ std::optional<std::string> FindBadSlot(const Drawing& drawing) {
     if (block < 0 || block > count) {
       return Named(entity) + " places the block " + std::to_string(block) + " that the drawing never had";
     }
+    if (Contained(entity, 0) != 0) containers.push_back(i);
   }
   return std::nullopt;
 }
 
 // Depth-first walk over the containment graph with an explicit stack, so that deep nesting
 // cannot overflow the call stack.
-std::optional<std::string> FindContainmentCycle(const Drawing& drawing) {
+std::optional<std::string> FindContainmentCycle(const Drawing& drawing, const std::vector<std::size_t>& containers) {
   enum : std::uint8_t { kUnseen, kOnPath, kDone };
   std::vector<std::uint8_t> state(drawing.slots.size(), kUnseen);
   struct Step {
@@ -71,9 +73,8 @@ std::optional<std::string> FindContainmentCycle(const Drawing& drawing) {
     std::size_t next;
   };
   std::vector<Step> path;
-  for (std::size_t root = 0; root < drawing.slots.size(); ++root) {
-    // Most entities contain nothing and cannot start a cycle.
-    if (state[root] != kUnseen || Contained(drawing.slots[root], 0) == 0) continue;
+  for (std::size_t root : containers) {
+    if (state[root] != kUnseen) continue;
     state[root] = kOnPath;
     path.push_back({root, 0});
     while (!path.empty()) {
@@ -100,8 +101,9 @@ std::optional<std::string> FindContainmentCycle(const Drawing& drawing) {
 }  // namespace
 
 std::optional<std::string> FindInconsistency(const Drawing& drawing) {
-  if (std::optional<std::string> problem = FindBadSlot(drawing)) return problem;
-  return FindContainmentCycle(drawing);
+  std::vector<std::size_t> containers;
+  if (std::optional<std::string> problem = FindBadSlot(drawing, containers)) return problem;
+  return FindContainmentCycle(drawing, containers);
 }
 
 }  // namespace wb::drawing_file

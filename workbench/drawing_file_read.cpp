@@ -6,9 +6,9 @@
 #include <limits>
 #include <string>
 
-#include "workbench/drawing_file_blobs.h"
 #include "workbench/drawing_file_check.h"
 #include "workbench/drawing_file_database.h"
+#include "workbench/drawing_file_details.h"
 #include "workbench/drawing_file_format.h"
 
 namespace wb::drawing_file {
@@ -71,27 +71,21 @@ void ReadLayers(const Connection& database, Drawing& drawing) {
 }
 
 // The storage class each entity column may hold besides NULL, and its name for messages.
-constexpr std::array<int, kEntityColumnCount> kColumnTypes = {SQLITE_INTEGER, SQLITE_BLOB, SQLITE_BLOB, SQLITE_TEXT,
-                                                               SQLITE_BLOB,    SQLITE_TEXT, SQLITE_TEXT, SQLITE_BLOB};
-constexpr std::array<const char*, kEntityColumnCount> kColumnNames = {
-    "handle", "header", "record", "name", "member list", "configuration path", "element name", "attribute record"};
+constexpr std::array<int, kEntityColumnCount> kColumnTypes = {SQLITE_INTEGER, SQLITE_BLOB, SQLITE_BLOB, SQLITE_BLOB};
+constexpr std::array<const char*, kEntityColumnCount> kColumnNames = {"handle", "header", "record", "details"};
 
-// Columns holding NULL are never asked for their value: a plain line then costs only a handful
-// of SQLite calls, which is what opening a large drawing spends most of its time on.
 void ReadEntity(const Statement& row, Entity& entity, host::EntityHandle handle) {
   std::array<bool, kEntityColumnCount> present{};
   for (int column = kColumnHeader; column < kEntityColumnCount; ++column) {
     const auto index = static_cast<std::size_t>(column);
     const int type = row.ColumnType(column);
     if (type != SQLITE_NULL && type != kColumnTypes[index]) {
-      throw BadContent(std::string("its ") + kColumnNames[index] + " has the wrong kind");
+      throw BadContent(std::string("the wrong kind of value in its ") + kColumnNames[index]);
     }
     present[index] = type != SQLITE_NULL;
   }
   if (!present[kColumnHeader]) {
-    if (std::find(present.begin(), present.end(), true) != present.end()) {
-      throw BadContent("deleted, yet it holds data");
-    }
+    if (present[kColumnRecord] || present[kColumnDetails]) throw BadContent("deleted, yet it holds data");
     return;  // stays a deleted slot
   }
   const std::span<const std::uint8_t> header = row.ColumnBlob(kColumnHeader);
@@ -104,11 +98,7 @@ void ReadEntity(const Statement& row, Entity& entity, host::EntityHandle handle)
     const std::span<const std::uint8_t> record = row.ColumnBlob(kColumnRecord);
     entity.record.assign(record.begin(), record.end());
   }
-  if (present[kColumnName]) entity.name = row.ColumnText(kColumnName);
-  if (present[kColumnConfigPath]) entity.configPath = row.ColumnText(kColumnConfigPath);
-  if (present[kColumnElementName]) entity.elementName = row.ColumnText(kColumnElementName);
-  if (present[kColumnMembers]) DecodeMembers(row.ColumnBlob(kColumnMembers), entity.members);
-  if (present[kColumnAttributes]) DecodeAttributes(row.ColumnBlob(kColumnAttributes), entity.attributes);
+  if (present[kColumnDetails]) DecodeDetails(row.ColumnBlob(kColumnDetails), entity);
 }
 
 void ReadEntities(const Connection& database, Drawing& drawing, std::size_t fileSize) {
@@ -117,9 +107,7 @@ void ReadEntities(const Connection& database, Drawing& drawing, std::size_t file
     const std::int64_t rows = last.Step() ? std::max<std::int64_t>(last.ColumnInt(0), 0) : 0;
     drawing.slots.reserve(std::min(static_cast<std::size_t>(rows), fileSize / kSmallestRow));
   }
-  Statement rows(database.Get(),
-                 "SELECT handle, header, record, name, members, config_path, element_name, attributes "
-                 "FROM entities ORDER BY handle");
+  Statement rows(database.Get(), "SELECT handle, header, record, details FROM entities ORDER BY handle");
   while (rows.Step()) {
     const std::int64_t handle = static_cast<std::int64_t>(drawing.slots.size()) + 1;
     if (handle > std::numeric_limits<host::EntityHandle>::max()) {

@@ -31,14 +31,6 @@ void Statement::BindText(int index, std::string_view text) {
   Check(sqlite3_bind_text64(statement_, index, text.data(), text.size(), SQLITE_STATIC, SQLITE_UTF8));
 }
 
-void Statement::BindTextOrNull(int index, std::string_view text) {
-  if (text.empty()) {
-    Check(sqlite3_bind_null(statement_, index));
-  } else {
-    BindText(index, text);
-  }
-}
-
 void Statement::BindBlobOrNull(int index, std::span<const std::uint8_t> bytes) {
   if (bytes.empty()) {
     Check(sqlite3_bind_null(statement_, index));

@@ -29,10 +29,10 @@ class Statement {
   // Readies an insert for the next row's values.
   void Reset() { sqlite3_reset(statement_); }
 
+  // Texts and blobs are not copied: they must stay put until the statement has run. Empty blobs
+  // are bound as NULL.
   void BindInt(int index, std::int64_t value);
   void BindText(int index, std::string_view text);
-  // Empty values are bound as NULL. The bytes must stay put until the next Step.
-  void BindTextOrNull(int index, std::string_view text);
   void BindBlobOrNull(int index, std::span<const std::uint8_t> bytes);
 
   int ColumnType(int column) const { return sqlite3_column_type(statement_, column); }

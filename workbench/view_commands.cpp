@@ -16,6 +16,7 @@ constexpr int kEyeSlot = 48;     // globp
 constexpr int kTargetSlot = 47;  // globp
 constexpr int kConeSlot = 64;    // globr
 constexpr float kWidestCone = 180.0F;
+constexpr float kPlanEyeHeight = 100.0F;  // above the plan's base point
 
 ViewState& View() { return Workbench::Get().View(); }
 
@@ -113,15 +114,43 @@ host::Status SetScaleMode() {
 }
 
 // A vertical cut needs a direction in plan: a cut line whose ends meet in plan has none.
+// The host turns the view to face a cut it is asked to show: square on to a section from the
+// side it keeps, straight down onto a plan, both in parallel projection.
+void FaceSection(const SectionCut& cut) {
+  const host::Point3f& start = cut.points[0];
+  const host::Point3f& end = cut.points[1];
+  const host::Point3f& side = cut.points[3];
+  const host::Point3f middle{(start.x + end.x) / 2.0F, (start.y + end.y) / 2.0F, start.z};
+  // The side point lies square to the line, as far from its start as the line is long.
+  const float awayX = middle.x - 2.0F * (side.x - start.x);
+  const float awayY = middle.y - 2.0F * (side.y - start.y);
+  ViewState& view = View();
+  view.target = middle;
+  view.eye = {awayX, awayY, middle.z};
+  view.perspective = false;
+}
+
+void FacePlan(const PlanView& plan) {
+  ViewState& view = View();
+  view.target = plan.base;
+  view.eye = {plan.base.x, plan.base.y, plan.base.z + kPlanEyeHeight};
+  view.perspective = false;
+}
+
+bool SectionPointsUsable(const std::array<host::Point3f, 4>& points) {
+  for (const host::Point3f& point : points) {
+    if (!IsFinite(point)) return false;
+  }
+  return !(points[0].x == points[1].x && points[0].y == points[1].y);
+}
+
 host::Status SetSectionPlane() {
   std::array<host::Point3f, 4> points{globp[0], globp[1], globp[2], globp[3]};
-  for (const host::Point3f& point : points) {
-    if (!IsFinite(point)) return 0;
-  }
-  if (points[0].x == points[1].x && points[0].y == points[1].y) return 0;
+  if (!SectionPointsUsable(points)) return 0;
   ViewState& view = View();
   view.section = SectionCut{points, globc[letter::kCutType], true};
   view.plan.active = false;
+  FaceSection(view.section);
   return host::kOk;
 }
 
@@ -132,6 +161,7 @@ host::Status ShowPlanView() {
   ViewState& view = View();
   view.plan = PlanView{globp[0], globp[1], globp[2], globp[3], globc[letter::kCutType], true};
   view.section.active = false;
+  FacePlan(view.plan);
   return host::kOk;
 }
 
@@ -157,5 +187,30 @@ constexpr NamedCommand kViewCommands[] = {
 }  // namespace
 
 std::span<const NamedCommand> ViewCommands() { return kViewCommands; }
+
+void TakeCutFromSolidBuild() {
+  if (globc[letter::kCutStyle] != 's') return;
+  const std::array<host::Point3f, 4> points{globp[0], globp[1], globp[2], globp[3]};
+  ViewState& view = View();
+  // The third point lies straight above the first for a section, beside it for a plan.
+  const bool vertical = points[2].x == points[0].x && points[2].y == points[0].y;
+  if (vertical) {
+    if (!SectionPointsUsable(points)) return;
+    view.section = SectionCut{points, globc[letter::kCutType], true};
+    view.plan.active = false;
+  } else {
+    for (const host::Point3f& point : points) {
+      if (!IsFinite(point)) return;
+    }
+    view.plan = PlanView{points[0], points[1], points[2], points[3], globc[letter::kCutType], true};
+    view.section.active = false;
+  }
+}
+
+void DropCuts() {
+  globc[letter::kCutStyle] = ' ';  // the next solid build carries no cut
+  View().section.active = false;
+  View().plan.active = false;
+}
 
 }  // namespace wb

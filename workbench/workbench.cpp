@@ -29,11 +29,18 @@ void Workbench::Reset() {
   memory_.Clear();
   cameraManagerOn_ = false;
   commandLines_.clear();
+  output2D_.Reset();
+  drawingPaths_.clear();
   // After the blocks are zeroed: view and display publish the values the host keeps in them.
   ResetArgumentBlocks();
   view_.Reset();
   display_.Reset();
   SetCurrent(Open(Drawing{}));
+}
+
+std::string Workbench::DrawingPath(host::DatabaseHandle database) const {
+  const auto found = drawingPaths_.find(database);
+  return found != drawingPaths_.end() ? found->second : std::string();
 }
 
 host::DatabaseHandle Workbench::Open(Drawing drawing) {

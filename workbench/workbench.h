@@ -14,6 +14,7 @@
 #include "workbench/attribute_records.h"
 #include "workbench/display_state.h"
 #include "workbench/drawing.h"
+#include "workbench/output2d_state.h"
 #include "workbench/faults.h"
 #include "workbench/host_memory.h"
 #include "workbench/journal.h"
@@ -82,6 +83,12 @@ class Workbench {
   // Runs the loaded plug-in's entry (the overlay "Pandex" does this); false when none.
   bool RunPluginEntry();
 
+  // The 2D commands' state (long names, symbols, selection, models in the making).
+  Output2DState& Output2D() { return output2D_; }
+  // The file a drawing was opened from or will be saved to; what db_title_file_name reports.
+  void SetDrawingPath(host::DatabaseHandle database, std::string path) { drawingPaths_[database] = std::move(path); }
+  std::string DrawingPath(host::DatabaseHandle database) const;
+
   // Whether the host shows the manager pane as on (SetCameraManagerOn / Off).
   bool CameraManagerOn() const { return cameraManagerOn_; }
   void SetCameraManagerOn(bool on) { cameraManagerOn_ = on; }
@@ -102,6 +109,8 @@ class Workbench {
   DisplayState display_;
   LayerTableSnapshot layerTable_;
   std::vector<std::string> commandLines_;
+  Output2DState output2D_;
+  std::map<host::DatabaseHandle, std::string> drawingPaths_;
   PluginExports plugin_;
   bool cameraManagerOn_ = false;
 };

@@ -76,6 +76,18 @@ TEST_F(DrawingFileRefusal, FilesOfOtherKinds) {
   ExpectRefused(folder_ / "other.db", Reason::NotADrawing, "(a database of another program)");
 }
 
+TEST_F(DrawingFileRefusal, HugeFilesAreJudgedByTheirHeaderBeforeBeingRead) {
+  // Sparse files: they take no disk, but reading one whole would take 64 GB of memory.
+  constexpr std::uintmax_t kHuge = std::uintmax_t{64} << 30;
+  const std::string text = "just text";
+  WriteBytes(folder_ / "huge.txt", {text.begin(), text.end()});
+  std::filesystem::resize_file(folder_ / "huge.txt", kHuge);
+  ExpectRefused(folder_ / "huge.txt", Reason::NotADrawing, "not a Pandex drawing file");
+  std::filesystem::copy_file(file_, folder_ / "huge.pdx");
+  std::filesystem::resize_file(folder_ / "huge.pdx", kHuge);
+  ExpectRefused(folder_ / "huge.pdx", Reason::Damaged, "(its size does not match its header)");
+}
+
 TEST_F(DrawingFileRefusal, FormatsOfOtherVersions) {
   std::filesystem::copy_file(file_, folder_ / "newer.pdx");
   RunSql(folder_ / "newer.pdx", "PRAGMA user_version = 2");
@@ -132,30 +144,42 @@ TEST_P(DrawingFileTampering, IsRefusedAsDamaged) {
   ExpectRefused(file_, Reason::Damaged, GetParam().expected);
 }
 
+// SQL that sets an entity's details to empty names and then the given hex bytes: the member
+// count and handles, then the attribute count and attributes.
+std::string SetDetails(host::EntityHandle entity, const std::string& hex) {
+  const std::string emptyNames = "000000000000000000000000";
+  return "UPDATE entities SET details = x'" + emptyNames + hex + "' WHERE handle = " + std::to_string(entity);
+}
+
 // In the sample: 1 line, 2 deleted, 3 text, 12 element, 13 group of 1, 3 and 12, 14 block of 11,
 // 15 placed block of 14.
 const Tampering kTamperings[] = {
     {"HeaderOfWrongSize", "UPDATE entities SET header = x'0102' WHERE handle = 1", "entity 1: its header has 2 bytes"},
-    {"HeaderOfWrongKind", "UPDATE entities SET header = 'text' WHERE handle = 1", "its header has the wrong kind"},
-    {"NameOfWrongKind", "UPDATE entities SET name = x'41' WHERE handle = 13", "entity 13: its name has the wrong kind"},
+    {"HeaderOfWrongKind", "UPDATE entities SET header = 'text' WHERE handle = 1",
+     "entity 1: the wrong kind of value in its header"},
+    {"DetailsOfWrongKind", "UPDATE entities SET details = 12 WHERE handle = 13",
+     "entity 13: the wrong kind of value in its details"},
     {"HandleMissing", "DELETE FROM entities WHERE handle = 4", "handles do not count up from 1: 5 where 4 belongs"},
     {"HandleZero", "INSERT INTO entities(handle, header) VALUES(0, zeroblob(18))", "0 where 1 belongs"},
-    {"DeletedSlotWithData", "UPDATE entities SET name = 'ghost' WHERE handle = 2", "entity 2: deleted, yet it holds"},
+    {"DeletedSlotWithRecord", "UPDATE entities SET record = x'00' WHERE handle = 2", "entity 2: deleted, yet it holds"},
+    {"DeletedSlotWithDetails", "UPDATE entities SET details = x'00' WHERE handle = 17", "entity 17: deleted, yet"},
     {"LineRecordOfWrongSize", "UPDATE entities SET record = x'00' WHERE handle = 1",
      "entity 1 has a record of 1 bytes where its type takes 28"},
-    {"UnknownAttributeType", "UPDATE entities SET attributes = x'02000000613d090000' WHERE handle = 3",
+    {"UnknownAttributeType", SetDetails(3, "00000000" "01000000" "02000000613d090000"),
      "entity 3: attribute 1 has the unknown type 9"},
-    {"AttributeCutShort", "UPDATE entities SET attributes = x'0500000061' WHERE handle = 3", "cut short"},
-    {"ForgedTextLength", "UPDATE entities SET attributes = x'02000000613d010000f0ffffff41' WHERE handle = 3",
-     "entity 3: an attribute record is cut short"},
-    {"ForgedVectorCount", "UPDATE entities SET attributes = x'02000000613d060000ffffff7f01000000' WHERE handle = 3",
-     "an attribute record is cut short"},
-    {"MemberOutOfRange", "UPDATE entities SET members = x'e8030000' WHERE handle = 13",
-     "entity 13 lists the member 1000"},
-    {"MemberListCutShort", "UPDATE entities SET members = x'010000' WHERE handle = 13", "member list is cut short"},
-    {"GroupInItself", "UPDATE entities SET members = x'010000000d000000' WHERE handle = 13",
-     "entity 13 contains itself"},
-    {"BlockPlacingItself", "UPDATE entities SET members = x'0f000000' WHERE handle = 14", "contains itself"},
+    {"AttributeCutShort", SetDetails(3, "00000000" "01000000" "0500000061"), "entity 3: its details are cut short"},
+    {"ForgedNameLength", "UPDATE entities SET details = x'f0ffffff41' WHERE handle = 3",
+     "its details are cut short"},
+    {"ForgedTextLength", SetDetails(3, "00000000" "01000000" "02000000613d010000f0ffffff41"),
+     "its details are cut short"},
+    {"ForgedVectorCount", SetDetails(3, "00000000" "01000000" "02000000613d060000ffffff7f01000000"),
+     "its details are cut short"},
+    {"MemberOutOfRange", SetDetails(13, "01000000e8030000" "00000000"), "entity 13 lists the member 1000"},
+    {"MemberListCutShort", SetDetails(13, "02000000010000"), "entity 13: its details are cut short"},
+    {"ForgedAttributeCount", SetDetails(3, "00000000" "ffffff7f"), "entity 3: its details are cut short"},
+    {"DetailsRunningOn", SetDetails(3, "00000000" "00000000" "00"), "entity 3: its details run on past their end"},
+    {"GroupInItself", SetDetails(13, "02000000010000000d000000" "00000000"), "entity 13 contains itself"},
+    {"BlockPlacingItself", SetDetails(14, "010000000f000000" "00000000"), "contains itself"},
     {"PlacedBlockOutOfRange",
      "UPDATE entities SET record = x'" + std::string(272, '0') + "0f270000" + std::string(8, '0') +
          "' WHERE handle = 15",
@@ -172,7 +196,7 @@ const Tampering kTamperings[] = {
      "SELECT i AS layer_index, 'x' AS name, 1 AS is_on FROM n",
      "it holds tables that are not a drawing's"},
     {"Trigger", "CREATE TRIGGER t AFTER INSERT ON drawing BEGIN SELECT 1; END", "not a drawing's"},
-    {"Index", "CREATE INDEX by_name ON entities(name)", "not a drawing's"},
+    {"Index", "CREATE INDEX by_record ON entities(record)", "not a drawing's"},
     {"ColumnAdded", "ALTER TABLE entities ADD COLUMN extra", "not a drawing's"},
     {"TableDropped", "DROP TABLE drawing", "tables of the drawing are missing"},
 };

@@ -1,0 +1,69 @@
+// Running the 2D batch from the command line and reporting where the files went.
+#include "app/build_2d_command.h"
+
+#include <filesystem>
+
+#include "app/plugin_session.h"
+#include "resources/string_table.h"
+#include "samples/sample_drawing.h"
+#include "shell/host/argument_blocks.h"
+#include "views/hr_camera_mgr.h"
+#include "views/view_collection.h"
+#include "workbench/drawing_file.h"
+#include "workbench/workbench.h"
+
+namespace app {
+namespace {
+
+constexpr int kBarWidth = 30;
+
+void ShowProgress(const HRUtility::BuildProgress& progress, bool bar, std::ostream& out) {
+  const HRUtility::BuildStep& step = *progress.step;
+  const char* outcome = step.outcome == HRUtility::BuildStep::Outcome::Saved ? "saved" : "FAILED";
+  if (!bar) {
+    out << progress.status << ": " << step.view << " -> " << step.file << " (" << outcome << ")\n";
+    return;
+  }
+  const int filled = progress.upper > 0 ? kBarWidth * progress.position / progress.upper : kBarWidth;
+  out << "\r[" << std::string(static_cast<std::size_t>(filled), '#')
+      << std::string(static_cast<std::size_t>(kBarWidth - filled), ' ') << "] " << progress.status << std::flush;
+}
+
+const char* OutcomeText(HRUtility::BuildStep::Outcome outcome) {
+  switch (outcome) {
+    case HRUtility::BuildStep::Outcome::Saved: return "saved";
+    case HRUtility::BuildStep::Outcome::Locked: return "skipped, in use by another user";
+    case HRUtility::BuildStep::Outcome::Failed: return "failed";
+  }
+  return "";
+}
+
+}  // namespace
+
+int RunBuild2D(const Build2DOptions& options, std::ostream& out, std::ostream& errors) {
+  const bool sample = options.drawing.empty();
+  const std::filesystem::path drawingPath =
+      sample ? std::filesystem::absolute(options.outputDir.empty() ? "." : options.outputDir) / "sample.pdx"
+             : std::filesystem::absolute(options.drawing);
+  PluginSession session(sample ? samples::MakeSampleDrawing() : wb::OpenDrawingFile(drawingPath));
+  wb::Workbench::Get().SetDrawingPath(db.handle, drawingPath.string());
+
+  SetDatabase(db.handle);
+  HRUtility::Build2DBatch batch(options.mode, CollectSectionHandles(db.handle), CollectPlanHandles(db.handle));
+  batch.OnProgress([&](const HRUtility::BuildProgress& progress) { ShowProgress(progress, options.progressBar, out); });
+  const HRUtility::BuildResult result = batch.Run();
+  if (options.progressBar && !result.steps.empty()) out << '\n';
+
+  if (result.folderRefused) {
+    errors << "pandex: " << resources::LoadString(resources::kIdsCannotCreate2DFolder) << " (" << result.folder
+           << ")\n";
+    return 1;
+  }
+  out << result.Saved() << " of " << result.total << " views saved to " << result.folder << '\n';
+  for (const HRUtility::BuildStep& step : result.steps) {
+    out << "  " << step.view << ": " << step.file << ".dxf, .svg (" << OutcomeText(step.outcome) << ")\n";
+  }
+  return result.AllSaved() ? 0 : 1;
+}
+
+}  // namespace app

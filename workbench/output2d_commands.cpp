@@ -1,0 +1,210 @@
+// The host's 2D commands and overlays: build the 2D model of the view (all edges, or hidden
+// lines removed), set entities aside and carry them over, clean lines up, and merge the result
+// into the target's DXF and SVG files.
+#include <algorithm>
+#include <cmath>
+#include <cstdlib>
+#include <filesystem>
+
+#include "shell/host/argument_blocks.h"
+#include "workbench/command_table.h"
+#include "workbench/draft/dxf_reader.h"
+#include "workbench/draft/generate_sheet.h"
+#include "workbench/draft/preserved_entities.h"
+#include "workbench/draft/sheet_files.h"
+#include "workbench/draft/stroke_cleanup.h"
+#include "workbench/draft/window_clip.h"
+#include "workbench/workbench.h"
+
+namespace wb {
+namespace {
+
+constexpr std::int32_t kTargetKind = 10;
+constexpr std::int32_t kSourceKind = 211;
+constexpr const char* kRewriteSymbol = "@config@save2drewrite";
+constexpr int kCleanupSlot = 41;
+constexpr int kToleranceSlot = 31;
+
+Output2DState& State() { return Workbench::Get().Output2D(); }
+
+draft::GenerateOptions OptionsForView(bool hideHiddenLines) {
+  const ViewState& view = Workbench::Get().View();
+  draft::GenerateOptions options;
+  options.view.eye = view.eye;
+  options.view.target = view.target;
+  options.view.perspective = view.perspective;
+  options.hideHiddenLines = hideHiddenLines;
+  if (view.section.active) options.section = draft::SectionCut{view.section.points, view.section.cutType};
+  if (view.plan.active) options.plan = draft::PlanCut{view.plan.base, view.plan.cutType};
+  return options;
+}
+
+draft::Sheet ModelOfView(bool hideHiddenLines) {
+  draft::Sheet sheet = draft::GenerateSheet(Workbench::Get().CurrentDrawing(), OptionsForView(hideHiddenLines));
+  const Drawing& drawing = Workbench::Get().CurrentDrawing();
+  for (int i = 0; i < kLayerCount; ++i) sheet.layerNames[static_cast<std::size_t>(i)] = drawing.layers[static_cast<std::size_t>(i)].name;
+  return sheet;
+}
+
+// The entity flags are the host's hidden bit; blanking for the generation uses it and
+// remembers which entities it changed, so that only those are shown again.
+void SetHidden(host::EntityHandle handle, bool hidden) {
+  Entity* entity = Workbench::Get().CurrentDrawing().Find(handle);
+  if (entity == nullptr) return;
+  std::uint8_t& flags = entity->header.bytes[host::kHeaderFlags];
+  flags = static_cast<std::uint8_t>(hidden ? (flags | host::kFlagHidden) : (flags & ~host::kFlagHidden));
+}
+
+std::string LongName(std::int32_t kind) {
+  const auto found = State().longNames.find(kind);
+  return found != State().longNames.end() ? found->second : std::string();
+}
+
+// The rewrite switch: 1 (also when the symbol is missing) replaces the target.
+bool OverwriteTarget() {
+  const auto found = State().symbols.find(kRewriteSymbol);
+  if (found == State().symbols.end()) return true;
+  return std::lround(std::strtod(found->second.c_str(), nullptr)) == 1;
+}
+
+host::Status Create2DModel() {
+  State().model = ModelOfView(false);
+  return host::kOk;
+}
+
+host::Status HiddenLines() {
+  State().hiddenLineModel = ModelOfView(true);
+  return host::kOk;
+}
+
+host::Status CopyHiddenLineModel() {
+  if (!State().hiddenLineModel) return 0;
+  State().model = std::move(*State().hiddenLineModel);
+  State().hiddenLineModel.reset();
+  return host::kOk;
+}
+
+host::Status SelectionExists() {
+  globr[0] = State().selection.empty() ? 0.0F : 1.0F;
+  return host::kOk;
+}
+
+host::Status AddSource() {
+  Output2DState& state = State();
+  if (!state.model) return 0;
+  state.sources.push_back(std::move(*state.model));
+  state.model.reset();
+  state.sourceTarget = LongName(kSourceKind);
+  return host::kOk;
+}
+
+host::Status MergeSources() {
+  Output2DState& state = State();
+  if (state.sources.empty() || state.sourceTarget.empty()) return 0;
+  draft::Sheet merged;
+  for (draft::Sheet& source : state.sources) {
+    merged.layerNames = source.layerNames;
+    merged.strokes.insert(merged.strokes.end(), source.strokes.begin(), source.strokes.end());
+    merged.labels.insert(merged.labels.end(), source.labels.begin(), source.labels.end());
+  }
+  state.sources.clear();
+  try {
+    draft::WriteSheetFiles(merged, state.sourceTarget, OverwriteTarget());
+  } catch (const std::exception&) {
+    return 0;  // the old files stay as they were
+  }
+  ++state.mergesWritten;
+  return host::kOk;
+}
+
+host::Status AutoClip() {
+  const std::string target = LongName(kTargetKind);
+  const std::filesystem::path dxf = target + ".dxf";
+  if (target.empty() || !std::filesystem::exists(dxf)) return 0;
+  try {
+    draft::Sheet sheet = draft::ReadDxfSheet(dxf);
+    const std::array<double, 4>& window = Workbench::Get().View().window;
+    draft::ClipToWindow(sheet, draft::Box2{{window[0], window[1]}, {window[2], window[3]}});
+    draft::WriteSheetFiles(sheet, target, true);
+  } catch (const std::exception&) {
+    return 0;
+  }
+  return host::kOk;
+}
+
+// Overlays ----------------------------------------------------------------------------------
+
+host::Status ClearOrKeepSelection() {
+  if (globc[0] == '0') State().selection.clear();
+  return host::kOk;
+}
+
+// "extract" with globr[9] = 1 sets the selection aside; with 0 it carries what was set aside
+// into the 2D model of the view.
+host::Status Extract() {
+  Output2DState& state = State();
+  if (globr[9] == 1.0F) {
+    state.preserved = state.selection;
+    return host::kOk;
+  }
+  if (!state.model) state.model = draft::Sheet{};
+  draft::AddPreservedEntities(Workbench::Get().CurrentDrawing(), state.preserved, OptionsForView(false).view,
+                              *state.model);
+  return host::kOk;
+}
+
+host::Status Blank() {
+  Output2DState& state = State();
+  switch (globc[0]) {
+    case '1':  // hide the selected entities for the generation
+      for (const host::EntityHandle handle : state.selection) {
+        const Entity* entity = Workbench::Get().CurrentDrawing().Find(handle);
+        if (entity == nullptr || entity->Hidden()) continue;
+        SetHidden(handle, true);
+        state.blanked.push_back(handle);
+      }
+      break;
+    case '0':  // show them again; globr[0] = 1 tells the caller all are back
+      for (const host::EntityHandle handle : state.blanked) SetHidden(handle, false);
+      state.blanked.clear();
+      globr[0] = 1.0F;
+      break;
+    case '6':
+      globr[114] = 1.0F;
+      break;
+    default:  // '2', '3', '4': the host's other blanking passes have nothing to do here
+      break;
+  }
+  return host::kOk;
+}
+
+host::Status CleanLines() {
+  Output2DState& state = State();
+  if (!state.model) return 0;
+  const auto code = static_cast<int>(std::lround(globr[kCleanupSlot]));
+  const double tolerance = globr[kToleranceSlot] > 0.0F ? globr[kToleranceSlot] : 0.01;
+  if ((code & 1) != 0) draft::RemoveCoincidentStrokes(*state.model, tolerance);
+  if ((code & 2) != 0) draft::MergeCollinearStrokes(*state.model, tolerance);
+  return host::kOk;
+}
+
+host::Status ConvertHiddenLines() { return State().hiddenLineModel ? host::kOk : 0; }
+
+constexpr NamedCommand kOutput2DCommands[] = {
+    {"create_2d_model", &Create2DModel},   {"hiden1", &HiddenLines},
+    {"qel_copy_file", &CopyHiddenLineModel}, {"selection_exist", &SelectionExists},
+    {"save2d_add_source", &AddSource},     {"merge_save2d_files", &MergeSources},
+    {"AutoClip", &AutoClip},
+};
+
+constexpr NamedCommand kOutput2DOverlays[] = {
+    {"qel_sel", &ClearOrKeepSelection}, {"extract", &Extract},   {"blank", &Blank},
+    {"shadows", &CleanLines},           {"hconv", &ConvertHiddenLines},
+};
+
+}  // namespace
+
+std::span<const NamedCommand> Output2DCommands() { return kOutput2DCommands; }
+std::span<const NamedCommand> Output2DOverlays() { return kOutput2DOverlays; }
+
+}  // namespace wb

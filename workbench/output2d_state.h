@@ -1,0 +1,35 @@
+// What the host's 2D commands work with between calls: registered long names, configuration
+// symbols, the selection, entities set aside for preservation, the 2D models being built and
+// the sources waiting to be merged into the target file.
+#pragma once
+
+#include <cstdint>
+#include <filesystem>
+#include <map>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "shell/host/host_types.h"
+#include "workbench/draft/sheet.h"
+
+namespace wb {
+
+struct Output2DState {
+  std::map<std::int32_t, std::string> longNames;  // by kind
+  std::map<std::string, std::string> symbols;     // host configuration symbols
+  std::vector<host::EntityHandle> selection;      // in selection order, no repeats
+  std::vector<host::EntityHandle> preserved;      // set aside by "extract" to be carried over
+  std::vector<host::EntityHandle> blanked;        // hidden for the generation, shown again after
+  std::optional<draft::Sheet> hiddenLineModel;    // "hiden1" output before "qel_copy_file"
+  std::optional<draft::Sheet> model;              // the 2D model of the view being made
+  std::vector<draft::Sheet> sources;              // handed to "merge_save2d_files"
+  std::string sourceTarget;                       // where those sources go
+  std::filesystem::path specialFolder;            // the host's folder for its own work files
+  int mergesWritten = 0;
+
+  // Back to a host that has made no 2D drawing; keeps the special folder.
+  void Reset();
+};
+
+}  // namespace wb
