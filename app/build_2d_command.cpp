@@ -43,8 +43,9 @@ const char* OutcomeText(HRUtility::BuildStep::Outcome outcome) {
 int RunBuild2D(const Build2DOptions& options, std::ostream& out, std::ostream& errors) {
   const bool sample = options.drawing.empty();
   const std::filesystem::path drawingPath =
-      sample ? std::filesystem::absolute(options.outputDir.empty() ? "." : options.outputDir) / "sample.pdx"
-             : std::filesystem::absolute(options.drawing);
+      (sample ? std::filesystem::absolute(options.outputDir.empty() ? "." : options.outputDir) / "sample.pdx"
+              : std::filesystem::absolute(options.drawing))
+          .lexically_normal();
   PluginSession session(sample ? samples::MakeSampleDrawing() : wb::OpenDrawingFile(drawingPath));
   wb::Workbench::Get().SetDrawingPath(db.handle, drawingPath.string());
 

@@ -1,6 +1,8 @@
 // Finding views by name and changing their 2D ticks; making a camera from eye and target.
 #include "app/view_edit.h"
 
+#include <algorithm>
+#include <cmath>
 #include <functional>
 #include <stdexcept>
 
@@ -48,14 +50,24 @@ Edit FindGeneralCamera(const std::string& name) {
   return nullptr;
 }
 
+// Names may hold '/' themselves: a general camera of the whole name comes first, then every
+// place the name could split into owner and camera.
 Edit FindView(const std::string& view) {
-  const std::size_t slash = view.find('/');
-  if (slash == std::string::npos) return FindGeneralCamera(view);
-  const std::string owner = view.substr(0, slash);
-  const std::string camera = view.substr(slash + 1);
+  if (Edit edit = FindGeneralCamera(view)) return edit;
   const host::DatabaseHandle database = GetCurrentDatabase();
-  if (Edit edit = FindOwnedCamera<HRSection>(CollectSectionHandles(database), owner, camera)) return edit;
-  return FindOwnedCamera<HRPlane>(CollectPlanHandles(database), owner, camera);
+  const std::vector<host::EntityHandle> sections = CollectSectionHandles(database);
+  const std::vector<host::EntityHandle> plans = CollectPlanHandles(database);
+  for (std::size_t slash = view.find('/'); slash != std::string::npos; slash = view.find('/', slash + 1)) {
+    const std::string owner = view.substr(0, slash);
+    const std::string camera = view.substr(slash + 1);
+    if (Edit edit = FindOwnedCamera<HRSection>(sections, owner, camera)) return edit;
+    if (Edit edit = FindOwnedCamera<HRPlane>(plans, owner, camera)) return edit;
+  }
+  return nullptr;
+}
+
+bool Finite(const std::array<float, 3>& point) {
+  return std::all_of(point.begin(), point.end(), [](float value) { return std::isfinite(value); });
 }
 
 }  // namespace
@@ -72,6 +84,10 @@ void SetTicks(const std::vector<std::string>& views, bool tick) {
 }
 
 std::int32_t AddCamera(const NewCamera& camera) {
+  if (camera.name.empty()) throw std::runtime_error("a camera needs a name");
+  if (!Finite(camera.eye) || !Finite(camera.target)) throw std::runtime_error("the eye and the target must be numbers");
+  // Without a direction there is no view to look along.
+  if (camera.eye == camera.target) throw std::runtime_error("the eye and the target must differ");
   SetDatabase(db.handle);
   CameraSettings settings;
   for (std::size_t i = 0; i < 3; ++i) {

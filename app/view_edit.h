@@ -11,9 +11,9 @@
 namespace app {
 
 // Ticks (or unticks) views of the drawing open in the workbench. A view is named as a general
-// camera's name, or "OWNER/CAMERA" for a camera of the section or plan OWNER (sections are
-// searched first). Throws std::runtime_error naming the first view not found; nothing is
-// changed then.
+// camera's name, or "OWNER/CAMERA" for a camera of the section or plan OWNER (a general camera
+// of the whole name first, then sections, then plans; names may hold '/' themselves). Throws
+// std::runtime_error naming the first view not found; nothing is changed then.
 void SetTicks(const std::vector<std::string>& views, bool tick);
 
 struct NewCamera {
@@ -27,7 +27,9 @@ struct NewCamera {
   bool tick = true;
 };
 
-// Adds a general camera to the drawing open in the workbench; answers its index.
+// Adds a general camera to the drawing open in the workbench; answers its index. Throws
+// std::runtime_error for an empty name, an eye or target that is not finite, or an eye on the
+// target.
 std::int32_t AddCamera(const NewCamera& camera);
 
 }  // namespace app

@@ -168,7 +168,13 @@ void Build2DBatch::OwnedPass(const std::vector<host::EntityHandle>& owners, bool
 BuildResult Build2DBatch::Run() {
   BuildResult result;
   const char* drawing = db_title_file_name();
-  const OutputNames names = OutputNamesFor(drawing != nullptr ? drawing : "");
+  // Without the drawing's name there is no place beside it; the folder would land wherever
+  // the host process happens to run.
+  if (drawing == nullptr || *drawing == '\0') {
+    result.folderRefused = true;
+    return result;
+  }
+  const OutputNames names = OutputNamesFor(drawing);
   result.folder = names.folder;
   std::error_code error;
   std::filesystem::create_directories(names.folder, error);

@@ -23,6 +23,7 @@ constexpr std::int32_t kSourceKind = 211;
 constexpr const char* kRewriteSymbol = "@config@save2drewrite";
 constexpr int kCleanupSlot = 41;
 constexpr std::uint8_t kNoPreserveFlag = 4;
+constexpr std::int32_t kLayerCount = 256;
 
 // Saved within one Save2D call.
 std::int32_t savedCleanup = 0;
@@ -41,7 +42,7 @@ constexpr std::array<CategoryRow, 32> kCategories = {{
     {9, 33, 0},  {1, 42, 1},  {5, 42, 1},  {10, 42, 1}, {4, 44, 1},  {12, 44, 1}, {1, 45, 1},  {10, 46, 1},
 }};
 
-void Run(const char* command) { execute_internal_command(command); }
+host::Status Run(const char* command) { return execute_internal_command(command); }
 void Overlay(const char* overlay) { execute_quorvel_overlay(overlay); }
 
 // Copies exactly the field's width, without a terminator.
@@ -51,6 +52,12 @@ void PutField(int first, const char (&text)[N]) {
 }
 
 bool DesignMode() { return globc[65] == 'p'; }
+
+// The loop reports a layer number in one byte, 256 as 0. Read as a signed byte, the numbers
+// from 128 up could never match and the upper half of the layer table could not be kept.
+bool OnLayer(std::uint8_t reported, std::int32_t layerNumber) {
+  return layerNumber >= 1 && layerNumber <= kLayerCount && reported == static_cast<std::uint8_t>(layerNumber);
+}
 
 // A float setting rounded to the integer it stands for; values without one give 0.
 std::int32_t RoundedSetting(double value) {
@@ -104,7 +111,7 @@ void SelectPreserved(bool dimensions, bool texts, bool walls, bool layerWanted, 
     if ((bytes[2] & kNoPreserveFlag) != 0) continue;
     const std::int32_t category = PreserveCategory(bytes[3], bytes[1]);
     const bool keep = (dimensions && category == 1) || (texts && category == 2) || (walls && category == 0) ||
-                      (layerWanted && static_cast<std::int8_t>(bytes[0]) == layerNumber);
+                      (layerWanted && OnLayer(bytes[0], layerNumber));
     if (keep) select_app_entity(db.handle, entity);
   }
   write_to_record(-1, -1);
@@ -199,6 +206,12 @@ void UnblankAfterGeneration() {
 bool Save2D(const std::string& target, std::uint8_t autoClip, std::uint8_t overwrite, std::uint8_t removeCoincident,
             std::uint8_t lineMerge, std::uint8_t preserveDimensions, std::uint8_t preserveText,
             std::uint8_t preserveWalls, std::uint8_t preserveLayer, std::int16_t preserveLayerIndex) {
+  // Asked before anything is set aside: finding the file in use after blanking the kept
+  // entities would leave them hidden in the drawing.
+  const char* registered = qel_get_long_name(kTargetKind);
+  const std::string name = registered != nullptr ? registered : "";
+  if (!IsTargetFree(name.c_str())) return false;
+
   const bool preserve =
       (preserveDimensions != 0 || preserveText != 0 || preserveWalls != 0 || preserveLayer != 0) && globc[26] == 'w';
   if (preserve) {
@@ -209,9 +222,6 @@ bool Save2D(const std::string& target, std::uint8_t autoClip, std::uint8_t overw
     BlankForGeneration();
   }
   globr[147] = 3.0F;
-  const char* registered = qel_get_long_name(kTargetKind);
-  const std::string name = registered != nullptr ? registered : "";
-  if (!IsTargetFree(name.c_str())) return false;
 
   PutField(9, "_save2d_");
   BuildModelOfView();
@@ -241,7 +251,9 @@ bool Save2D(const std::string& target, std::uint8_t autoClip, std::uint8_t overw
   Run("save2d_add_source");
 
   SetRewriteSwitch(overwrite);
-  Run("merge_save2d_files");
+  // The merge is what writes the file: a merge that failed is no saved drawing, though the
+  // settings are put back all the same.
+  const bool merged = Run("merge_save2d_files") == host::kOk;
   RestoreRewriteSwitch();
   if (autoClip != 0) Run("AutoClip");
   RestoreLineCleanup();
@@ -249,7 +261,7 @@ bool Save2D(const std::string& target, std::uint8_t autoClip, std::uint8_t overw
     UnblankAfterGeneration();
     ClearSelection();
   }
-  return true;
+  return merged;
 }
 
 }  // namespace HRUtility

@@ -7,7 +7,8 @@
 namespace HRUtility {
 
 // Preserve options name entities carried into the 2D drawing unchanged: walls (category 0),
-// dimensions (1), texts (2) and one layer. Answers false when the registered file is locked.
+// dimensions (1), texts (2) and one layer. Answers false when the registered file is locked
+// (then nothing is done) or when the host could not write it.
 bool Save2D(const std::string& target, std::uint8_t autoClip, std::uint8_t overwrite, std::uint8_t removeCoincident,
             std::uint8_t lineMerge, std::uint8_t preserveDimensions, std::uint8_t preserveText,
             std::uint8_t preserveWalls, std::uint8_t preserveLayer, std::int16_t preserveLayerIndex);

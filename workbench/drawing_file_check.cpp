@@ -67,7 +67,9 @@ std::optional<std::string> FindBadSlot(const Drawing& drawing, std::vector<std::
 // cannot overflow the call stack.
 std::optional<std::string> FindContainmentCycle(const Drawing& drawing, const std::vector<std::size_t>& containers) {
   enum : std::uint8_t { kUnseen, kOnPath, kDone };
-  std::vector<std::uint8_t> state(drawing.slots.size(), kUnseen);
+  // Entities that contain nothing cannot be on a cycle: marked done, they are never visited.
+  std::vector<std::uint8_t> state(drawing.slots.size(), kDone);
+  for (std::size_t container : containers) state[container] = kUnseen;
   struct Step {
     std::size_t slot;
     std::size_t next;

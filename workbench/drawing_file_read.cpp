@@ -17,14 +17,6 @@ namespace {
 // The fewest bytes a stored entity row takes, deleted ones included.
 constexpr std::size_t kSmallestRow = 4;
 
-void CheckPages(const Connection& database) {
-  Statement check(database.Get(), "PRAGMA quick_check(1)");
-  std::string verdict = check.Step() ? std::string(check.ColumnText(0)) : "no verdict from the page check";
-  if (verdict == "ok") return;
-  std::replace(verdict.begin(), verdict.end(), '\n', ' ');
-  throw BadContent(verdict);
-}
-
 // Exactly the objects of kSchema, so no forged view or trigger is ever run.
 void CheckSchema(const Connection& database) {
   Statement objects(database.Get(), "SELECT type, name, tbl_name, sql FROM sqlite_schema");
@@ -127,8 +119,15 @@ void ReadEntities(const Connection& database, Drawing& drawing, std::size_t file
 
 }  // namespace
 
+void CheckPages(const Connection& database) {
+  Statement check(database.Get(), "PRAGMA quick_check(1)");
+  std::string verdict = check.Step() ? std::string(check.ColumnText(0)) : "no verdict from the page check";
+  if (verdict == "ok") return;
+  std::replace(verdict.begin(), verdict.end(), '\n', ' ');
+  throw BadContent(verdict);
+}
+
 Drawing ReadDrawingDatabase(const Connection& database, std::size_t fileSize) {
-  CheckPages(database);
   CheckSchema(database);
   Drawing drawing;
   ReadTitle(database, drawing);

@@ -57,14 +57,13 @@ void Connection::Open(const std::string& path) {
   if (sqlite3_open_v2(path.c_str(), &connection_, kFlags, nullptr) != SQLITE_OK) Fail();
 }
 
-void Connection::Deserialize(unsigned char* bytes, std::size_t size) {
-  if (sqlite3_open_v2(":memory:", &connection_, kFlags, nullptr) != SQLITE_OK) {
-    sqlite3_free(bytes);
-    Fail();
-  }
-  const auto length = static_cast<sqlite3_int64>(size);
-  if (sqlite3_deserialize(connection_, "main", bytes, length, length,
-                          SQLITE_DESERIALIZE_READONLY | SQLITE_DESERIALIZE_FREEONCLOSE) != SQLITE_OK) {
+void Connection::Deserialize(std::span<const unsigned char> bytes) {
+  if (sqlite3_open_v2(":memory:", &connection_, kFlags, nullptr) != SQLITE_OK) Fail();
+  const auto length = static_cast<sqlite3_int64>(bytes.size());
+  // Read-only and not resizable: SQLite never writes to the bytes, so casting away const is safe
+  // and several connections can read them at once.
+  if (sqlite3_deserialize(connection_, "main", const_cast<unsigned char*>(bytes.data()), length, length,
+                          SQLITE_DESERIALIZE_READONLY) != SQLITE_OK) {
     Fail();
   }
 }

@@ -57,9 +57,8 @@ class Connection {
 
   // Opens an existing file for writing; the path must not be read as a URI (keep it absolute).
   void Open(const std::string& path);
-  // Serves a read-only database from memory that SQLite takes over (freed with sqlite3_free,
-  // even when this throws).
-  void Deserialize(unsigned char* bytes, std::size_t size);
+  // Serves a read-only database from the bytes, which must outlive the connection.
+  void Deserialize(std::span<const unsigned char> bytes);
   void Execute(const char* sql);
   // Closing can fail, and a save must know.
   void Close();

@@ -66,11 +66,15 @@ host::Status Session_CheckLockEx(const char* file, char userText[host::kLockText
                                  char detailText[host::kLockTextSize]) {
   if (auto fault = Fault("Session_CheckLockEx")) return call::AsStatus(*fault);
   if (file == nullptr || *file == '\0') return 0;
+  const std::filesystem::path dxf = std::string(file) + ".dxf";
   bool locked = false;
   try {
-    locked = draft::IsLockedByAnotherProcess(std::string(file) + ".dxf");
+    locked = draft::IsLockedByAnotherProcess(dxf);
   } catch (const std::exception&) {
-    locked = true;  // a file that exists but cannot be opened is in no state to be replaced
+    // A file that exists but cannot be opened is in no state to be replaced; a name no file
+    // can have (too long, say) is nobody's file, and the save reports its own failure.
+    std::error_code error;
+    locked = std::filesystem::exists(dxf, error);
   }
   if (userText != nullptr) std::snprintf(userText, host::kLockTextSize, "%s", locked ? "another process" : "");
   if (detailText != nullptr) std::snprintf(detailText, host::kLockTextSize, "%s", locked ? "advisory lock held" : "");

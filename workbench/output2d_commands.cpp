@@ -98,18 +98,23 @@ host::Status AddSource() {
   return host::kOk;
 }
 
+// The sources are taken whether or not they can be written: left behind, they would end up in
+// the next view's file.
 host::Status MergeSources() {
   Output2DState& state = State();
-  if (state.sources.empty() || state.sourceTarget.empty()) return 0;
+  std::vector<draft::Sheet> sources = std::move(state.sources);
+  state.sources.clear();
+  if (sources.empty() || state.sourceTarget.empty()) return 0;
   draft::Sheet merged;
-  for (draft::Sheet& source : state.sources) {
+  for (draft::Sheet& source : sources) {
     merged.layerNames = source.layerNames;
     merged.strokes.insert(merged.strokes.end(), source.strokes.begin(), source.strokes.end());
     merged.labels.insert(merged.labels.end(), source.labels.begin(), source.labels.end());
   }
-  state.sources.clear();
+  const bool replace = OverwriteTarget();
+  state.lastMergeReplaced = replace;
   try {
-    draft::WriteSheetFiles(merged, state.sourceTarget, OverwriteTarget());
+    draft::WriteSheetFiles(merged, state.sourceTarget, replace);
   } catch (const std::exception&) {
     return 0;  // the old files stay as they were
   }
@@ -139,17 +144,27 @@ host::Status ClearOrKeepSelection() {
   return host::kOk;
 }
 
-// "extract" with globr[9] = 1 sets the selection aside; with 0 it carries what was set aside
-// into the 2D model of the view.
+// "extract" with globr[9] = 1 sets aside what the selection shows on screen (an entity hidden
+// or on a layer switched off is no part of the view); with 0 it carries that into the 2D model
+// of the view, once: a later view that set nothing aside (its selection was empty) must not
+// receive this one's entities.
 host::Status Extract() {
   Output2DState& state = State();
   if (globr[9] == 1.0F) {
-    state.preserved = state.selection;
+    const Drawing& drawing = Workbench::Get().CurrentDrawing();
+    state.preserved.clear();
+    for (const host::EntityHandle handle : state.selection) {
+      const Entity* entity = drawing.Find(handle);
+      if (entity != nullptr && !entity->Hidden() && drawing.layers[entity->header.bytes[host::kHeaderLayer]].on) {
+        state.preserved.push_back(handle);
+      }
+    }
     return host::kOk;
   }
+  const std::vector<host::EntityHandle> preserved = std::move(state.preserved);
+  state.preserved.clear();
   if (!state.model) state.model = draft::Sheet{};
-  draft::AddPreservedEntities(Workbench::Get().CurrentDrawing(), state.preserved, OptionsForView(false).view,
-                              *state.model);
+  draft::AddPreservedEntities(Workbench::Get().CurrentDrawing(), preserved, OptionsForView(false).view, *state.model);
   return host::kOk;
 }
 
@@ -183,6 +198,8 @@ host::Status CleanLines() {
   if (!state.model) return 0;
   const auto code = static_cast<int>(std::lround(globr[kCleanupSlot]));
   const double tolerance = globr[kToleranceSlot] > 0.0F ? globr[kToleranceSlot] : 0.01;
+  state.lastCleanupCode = code;
+  state.lastCleanupTolerance = tolerance;
   if ((code & 1) != 0) draft::RemoveCoincidentStrokes(*state.model, tolerance);
   if ((code & 2) != 0) draft::MergeCollinearStrokes(*state.model, tolerance);
   return host::kOk;

@@ -27,6 +27,12 @@ struct Output2DState {
   std::string sourceTarget;                       // where those sources go
   std::filesystem::path specialFolder;            // the host's folder for its own work files
   int mergesWritten = 0;
+  // How the last clean-up and the last merge were asked to work, as the host log would show:
+  // the clean-up code (1 coincident lines, 2 merge, -1 none ran) and its tolerance, and
+  // whether the merge replaced its target or added to it.
+  int lastCleanupCode = -1;
+  double lastCleanupTolerance = 0.0;
+  std::optional<bool> lastMergeReplaced;
 
   // Back to a host that has made no 2D drawing; keeps the special folder.
   void Reset();

@@ -27,4 +27,35 @@ check missing-file 1 '^pandex: .+' -- "$pandex" info "$work/none.pdx"
 printf 'not a drawing at all\n' >"$work/foreign.pdx"
 check foreign-file 1 '^pandex: .+' -- "$pandex" info "$work/foreign.pdx"
 check unwritable 1 '^pandex: .+' -- "$pandex" sample "$work/no/such/folder/x.pdx"
+# 2D output: the sample's batch into a scratch folder, ticks, a new camera, and refusals.
+count_dxf() { find "$1" -maxdepth 1 -name '*.dxf' | wc -l; }
+absent() { [ ! -e "$1" ] && echo absent; }
+check build-2d-help 0 '--mode' -- "$pandex" build-2d --help
+check build-2d-sample 0 '^6 of 6 views saved to .*/out/2D_$' -- "$pandex" build-2d --output-dir "$work/out"
+check build-2d-files 0 '^6$' -- count_dxf "$work/out/2D_"
+check build-2d-progress 0 '^File 6 of 6: Ground floor_Default' -- "$pandex" build-2d --output-dir "$work/out"
+"$pandex" sample "$work/views.pdx" >/dev/null
+check untick 0 'Unticked 2 views' -- "$pandex" untick "$work/views.pdx" "Street perspective" "A/Default"
+check build-2d-unticked 0 '^4 of 4 views saved' -- "$pandex" build-2d "$work/views.pdx"
+check build-2d-no-unticked-file 0 '^absent$' -- absent "$work/2D_/views_Street perspective.dxf"
+check tick 0 'Ticked 1 views' -- "$pandex" tick "$work/views.pdx" "A/Default"
+check build-2d-sections 0 '^2 of 2 views saved' -- "$pandex" build-2d "$work/views.pdx" --mode sections
+check add-camera 0 'Added camera "North"' -- "$pandex" add-camera "$work/views.pdx" North --eye 5 30 5 --target 5 4 2
+check build-2d-cameras 0 'North: .*/2D_/views_North\.dxf, \.svg \(saved\)' -- \
+  "$pandex" build-2d "$work/views.pdx" --mode cameras
+check add-camera-unticked 0 'Added camera' -- \
+  "$pandex" add-camera "$work/views.pdx" South --eye 5 -30 5 --target 5 4 2 --no-tick --perspective
+check build-2d-skips-unticked 0 '^3 of 3 views saved' -- "$pandex" build-2d "$work/views.pdx" --mode cameras
+check untick-unknown 1 '^pandex: no view named "Nope"' -- "$pandex" untick "$work/views.pdx" North Nope
+check untick-keeps-all 0 '^3 of 3 views saved' -- "$pandex" build-2d "$work/views.pdx" --mode cameras
+check add-camera-no-direction 1 '^pandex: the eye and the target must differ' -- \
+  "$pandex" add-camera "$work/views.pdx" Flat --eye 1 1 1 --target 1 1 1
+check add-camera-not-a-number 1 '^pandex: the eye and the target must be numbers' -- \
+  "$pandex" add-camera "$work/views.pdx" Odd --eye nan 1 1 --target 1 1 1
+check add-camera-no-target 106 'target is required' -- "$pandex" add-camera "$work/views.pdx" N --eye 1 2 3
+check build-2d-bad-mode 105 'bogus not in' -- "$pandex" build-2d --mode bogus
+check build-2d-missing 1 '^pandex: .+none\.pdx' -- "$pandex" build-2d "$work/none.pdx"
+mkdir "$work/blocked" && cp "$work/views.pdx" "$work/blocked/views.pdx" && : >"$work/blocked/2D_"
+check build-2d-no-folder 1 '^pandex: Cannot create 2D folder\. \(.*/blocked/2D_\)' -- \
+  "$pandex" build-2d "$work/blocked/views.pdx"
 [ "$failures" -eq 0 ]

@@ -67,14 +67,6 @@ TEST(HiddenLinesCube, IsometricViewHidesEdgesLyingUnderVisibleOnes) {
   EXPECT_TRUE(draft_test::SameStrokes(sheet.strokes, EdgesAwayFromOrigin(Projection(options.view)), 1e-6));
 }
 
-TEST(HiddenLinesCube, WithoutRemovalAllTwelveEdgesShow) {
-  wb::Drawing drawing;
-  AddBox(drawing, {0, 0, 0}, {1, 1, 1});
-  auto options = Hidden({6.0F, 5.0F, 4.0F}, {0.5F, 0.5F, 0.5F});
-  options.hideHiddenLines = false;
-  EXPECT_EQ(GenerateSheet(drawing, options).strokes.size(), 12U);
-}
-
 TEST(HiddenLinesPartial, BoxBehindBoxIsCutWhereTheFrontOneEnds) {
   wb::Drawing drawing;
   AddBox(drawing, {0, 0, 0}, {2, 1, 2}, 0, 1);
@@ -168,6 +160,32 @@ TEST(HiddenLinesVisibility, HiddenEntitiesAndLayersThatAreOffHideNothing) {
   drawing.layers[3].on = false;
   const auto sheet = GenerateSheet(drawing, FrontView());
   EXPECT_TRUE(draft_test::SameStrokes(sheet.strokes, {{{0, 1}, {2, 1}}}));
+}
+
+
+TEST(SheetAttributes, StrokesTakeTheirEntitysLayerAndColourAndTheSheetTheLayerNames) {
+  wb::Drawing drawing;
+  drawing.layers[4].name = "Walls";
+  AddLine(drawing, {0, 0, 0}, {1, 0, 0}, 4, 12);
+  AddLine(drawing, {0, 0, 1}, {1, 0, 1}, 5, 0);  // colour 0 cannot be drawn: the foreground
+  wb::draft::GenerateOptions options = FrontView();
+  const auto sheet = GenerateSheet(drawing, options);
+  ASSERT_EQ(sheet.strokes.size(), 2U);
+  EXPECT_EQ(sheet.strokes[0].layer, 4);
+  EXPECT_EQ(sheet.strokes[0].color, 12);
+  EXPECT_EQ(sheet.strokes[1].layer, 5);
+  EXPECT_EQ(sheet.strokes[1].color, 7);
+  EXPECT_EQ(sheet.layerNames[4], "Walls");
+  EXPECT_EQ(sheet.layerNames[5], drawing.layers[5].name);
+}
+
+TEST(SheetAttributes, TextsAreNotDrawnAsLines) {
+  wb::Drawing drawing;
+  wb::Entity& text = AddLine(drawing, {0, 0, 0}, {1, 0, 0});
+  wb::Attribute& block = text.attributes.emplace_back();
+  block.name = "tb=";
+  block.type = wb::AttributeType::FloatVector;
+  EXPECT_TRUE(GenerateSheet(drawing, FrontView()).strokes.empty());
 }
 
 }  // namespace

@@ -3,7 +3,6 @@
 
 #include <array>
 #include <optional>
-#include <vector>
 
 #include "shell/host/host_types.h"
 #include "workbench/draft/half_space.h"

@@ -1,6 +1,8 @@
 // Gathers the shown lines and solids, cuts them, projects them and removes hidden lines.
 #include "workbench/draft/generate_sheet.h"
 
+#include <array>
+
 #include <algorithm>
 #include <cmath>
 
@@ -69,20 +71,72 @@ class SheetBuilder {
   Sheet Build() {
     Sheet sheet;
     for (std::size_t i = 0; i < sheet.layerNames.size(); ++i) sheet.layerNames[i] = drawing_.layers[i].name;
+    // Block members are drawn where their blocks are placed, never on their own.
+    std::vector<bool> member(drawing_.slots.size() + 1, false);
     for (const Entity& entity : drawing_.slots) {
-      if (!Shown(drawing_, entity)) continue;
-      if (entity.Type() == host::kTypeSolid) {
-        if (auto mesh = ReadSolidMesh(entity)) AddSolid(Weld(*mesh), EntityStyle(entity));
-      } else if (entity.Type() == host::kTypeLine && entity.FindAttribute("tb=") == nullptr) {
-        const auto line = ReadRecord<host::LineRecord>(entity);
-        AddLine({Widen(line.start), Widen(line.end)}, EntityStyle(entity));
+      if (!entity.Alive() || entity.Type() != host::kTypeBlock) continue;
+      for (const host::EntityHandle handle : entity.members) {
+        if (handle > 0 && static_cast<std::size_t>(handle) < member.size()) member[static_cast<std::size_t>(handle)] = true;
       }
+    }
+    for (const Entity& entity : drawing_.slots) {
+      if (!Shown(drawing_, entity) || member[static_cast<std::size_t>(entity.handle)]) continue;
+      AddEntity(entity, kIdentity, 0);
     }
     EmitStrokes(sheet);
     return sheet;
   }
 
  private:
+  using Placement = std::array<double, 16>;  // row-vector 4x4, translation in row 3
+  static constexpr Placement kIdentity = {1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};
+  // Blocks placed inside placed blocks are followed this deep; a damaged drawing whose blocks
+  // place each other can then not recurse without end.
+  static constexpr int kMaxNesting = 8;
+
+  static Vec3 Place(const Placement& m, Vec3 p) {
+    return {p.x * m[0] + p.y * m[4] + p.z * m[8] + m[12], p.x * m[1] + p.y * m[5] + p.z * m[9] + m[13],
+            p.x * m[2] + p.y * m[6] + p.z * m[10] + m[14]};
+  }
+
+  // The placement of a block inside `outer`: inner first, then outer (row vectors).
+  static Placement Combine(const double (&inner)[16], const Placement& outer) {
+    Placement combined{};
+    for (int r = 0; r < 4; ++r) {
+      for (int c = 0; c < 4; ++c) {
+        double sum = 0.0;
+        for (int k = 0; k < 4; ++k) sum += inner[4 * r + k] * outer[static_cast<std::size_t>(4 * k + c)];
+        combined[static_cast<std::size_t>(4 * r + c)] = sum;
+      }
+    }
+    return combined;
+  }
+
+  void AddEntity(const Entity& entity, const Placement& placement, int nesting) {
+    if (entity.Type() == host::kTypeSolid) {
+      auto mesh = ReadSolidMesh(entity);
+      if (!mesh) return;
+      if (nesting > 0) {
+        for (host::Point3f& point : mesh->vertices) {
+          const Vec3 placed = Place(placement, Widen(point));
+          point = {static_cast<float>(placed.x), static_cast<float>(placed.y), static_cast<float>(placed.z)};
+        }
+      }
+      AddSolid(Weld(*mesh), EntityStyle(entity));
+    } else if (entity.Type() == host::kTypeLine && entity.FindAttribute("tb=") == nullptr) {
+      const auto line = ReadRecord<host::LineRecord>(entity);
+      AddLine({Place(placement, Widen(line.start)), Place(placement, Widen(line.end))}, EntityStyle(entity));
+    } else if (entity.Type() == host::kTypePlacedBlock && nesting < kMaxNesting) {
+      const auto placed = ReadRecord<host::PlacedBlockRecord>(entity);
+      const Entity* block = drawing_.Find(placed.block);
+      if (block == nullptr || block->Type() != host::kTypeBlock) return;
+      const Placement inner = Combine(placed.placement, placement);
+      for (const host::EntityHandle handle : block->members) {
+        const Entity* part = drawing_.Find(handle);
+        if (part != nullptr && Shown(drawing_, *part)) AddEntity(*part, inner, nesting + 1);
+      }
+    }
+  }
   void Measure(Vec3 point) { worldScale_ = std::max(worldScale_, MaxAbs(point)); }
 
   void AddSolid(const WeldedMesh& mesh, Style style) {

@@ -10,15 +10,13 @@ namespace {
 
 double Cross2(double ax, double ay, double bx, double by) { return ax * by - ay * bx; }
 
-Box2 BoxAround(const std::array<Vec3, 3>& corners, double margin) {
-  Box2 box{{corners[0].x, corners[0].y}, {corners[0].x, corners[0].y}};
-  for (const Vec3& corner : corners) {
-    box.min = {std::min(box.min.x, corner.x), std::min(box.min.y, corner.y)};
-    box.max = {std::max(box.max.x, corner.x), std::max(box.max.y, corner.y)};
-  }
-  box.min = {box.min.x - margin, box.min.y - margin};
-  box.max = {box.max.x + margin, box.max.y + margin};
-  return box;
+void Include(Box2& box, double x, double y) {
+  box.min = {std::min(box.min.x, x), std::min(box.min.y, y)};
+  box.max = {std::max(box.max.x, x), std::max(box.max.y, y)};
+}
+
+Box2 Widened(Box2 box, double margin) {
+  return {{box.min.x - margin, box.min.y - margin}, {box.max.x + margin, box.max.y + margin}};
 }
 
 // Narrows `range` to where value + t * slope >= 0.
@@ -42,7 +40,7 @@ HiddenLines::HiddenLines(std::vector<ScreenTriangle> triangles, std::vector<Scre
   triangles_.reserve(triangles.size());
   for (const ScreenTriangle& triangle : triangles) AddTriangle(triangle, boxes);
   for (ScreenRegion& region : regions) AddRegion(std::move(region), boxes);
-  grid_ = OccluderGrid(boxes);
+  grid_ = BoxGrid(boxes);
 }
 
 void HiddenLines::AddTriangle(const ScreenTriangle& triangle, std::vector<Box2>& boxes) {
@@ -73,7 +71,9 @@ void HiddenLines::AddTriangle(const ScreenTriangle& triangle, std::vector<Box2>&
   prepared.points = triangle.points;
   triangles_.push_back(prepared);
   nearestZ_.push_back(std::min({p[0].z, p[1].z, p[2].z}));
-  boxes.push_back(BoxAround(p, tolerance_.flat));
+  Box2 box{{p[0].x, p[0].y}, {p[0].x, p[0].y}};
+  for (const Vec3& corner : p) Include(box, corner.x, corner.y);
+  boxes.push_back(Widened(box, tolerance_.flat));
 }
 
 void HiddenLines::AddRegion(ScreenRegion region, std::vector<Box2>& boxes) {
@@ -83,14 +83,13 @@ void HiddenLines::AddRegion(ScreenRegion region, std::vector<Box2>& boxes) {
   double nearest = HUGE_VAL;
   for (const auto& segment : region.boundary) {
     for (const Point2& point : segment) {
-      box.min = {std::min(box.min.x, point.x), std::min(box.min.y, point.y)};
-      box.max = {std::max(box.max.x, point.x), std::max(box.max.y, point.y)};
+      Include(box, point.x, point.y);
       nearest = std::min(nearest, region.zx * point.x + region.zy * point.y + region.z0);
     }
   }
   regions_.push_back(std::move(region));
   nearestZ_.push_back(nearest);
-  boxes.push_back(box);
+  boxes.push_back(Widened(box, tolerance_.flat));
 }
 
 HiddenLines::Scratch HiddenLines::MakeScratch() const {
@@ -204,9 +203,7 @@ std::vector<Interval> HiddenLines::VisibleParts(const ScreenEdge& edge, Scratch&
   hidden.clear();
   const double farthest = std::max(edge.a.z, edge.b.z);
   // Only an occluder reaching nearer than the edge's far end can hide any of it.
-  const auto canHide = [&](std::size_t index) {
-    return farthest - nearestZ_[index] > tolerance_.depthAbsolute + tolerance_.depthRelative * std::fabs(nearestZ_[index]);
-  };
+  const auto canHide = [&](std::size_t index) { return farthest - nearestZ_[index] > tolerance_.depthAbsolute; };
 
   grid_.ForEachAlong({edge.a.x, edge.a.y}, {edge.b.x, edge.b.y}, tolerance_.flat, [&](std::uint32_t index) {
     if (scratch.seen[index] == scratch.query) return true;

@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "workbench/draft/interval.h"
-#include "workbench/draft/occluder_grid.h"
+#include "workbench/draft/box_grid.h"
 #include "workbench/draft/sheet.h"
 #include "workbench/draft/vec3.h"
 
@@ -90,7 +90,7 @@ class HiddenLines {
   std::vector<Triangle> triangles_;
   std::vector<ScreenRegion> regions_;
   std::vector<double> nearestZ_;  // per occluder (triangles, then regions): its least z
-  OccluderGrid grid_;
+  BoxGrid grid_;
 };
 
 }  // namespace wb::draft

@@ -69,7 +69,7 @@ CleanupSet PrepareCleanup(std::vector<Stroke> strokes, double tolerance) {
     boxes.push_back({{std::min(stroke.a.x, stroke.b.x) - tolerance, std::min(stroke.a.y, stroke.b.y) - tolerance},
                      {std::max(stroke.a.x, stroke.b.x) + tolerance, std::max(stroke.a.y, stroke.b.y) + tolerance}});
   }
-  set.grid = OccluderGrid(boxes);
+  set.grid = BoxGrid(boxes);
   return set;
 }
 

@@ -4,7 +4,7 @@
 #include <cstddef>
 #include <vector>
 
-#include "workbench/draft/occluder_grid.h"
+#include "workbench/draft/box_grid.h"
 #include "workbench/draft/sheet.h"
 
 namespace wb::draft {
@@ -26,7 +26,7 @@ struct StrokeLine {
 struct CleanupSet {
   std::vector<Stroke> ordered;
   std::vector<Stroke> untouched;  // preserved strokes
-  OccluderGrid grid;              // over `ordered`, boxes widened by the tolerance
+  BoxGrid grid;              // over `ordered`, boxes widened by the tolerance
 };
 CleanupSet PrepareCleanup(std::vector<Stroke> strokes, double tolerance);
 

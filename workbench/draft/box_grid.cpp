@@ -1,5 +1,5 @@
-// Building the occluder grid: counted first, then filled, into one flat list.
-#include "workbench/draft/occluder_grid.h"
+// Building the box grid: counted first, then filled, into one flat list.
+#include "workbench/draft/box_grid.h"
 
 #include <algorithm>
 #include <cmath>
@@ -24,7 +24,7 @@ int CellIndex(double position, int count) {
 
 }  // namespace
 
-OccluderGrid::OccluderGrid(const std::vector<Box2>& boxes) {
+BoxGrid::BoxGrid(const std::vector<Box2>& boxes) {
   if (boxes.empty()) return;
   bounds_ = boxes.front();
   for (const Box2& box : boxes) {
@@ -59,8 +59,8 @@ OccluderGrid::OccluderGrid(const std::vector<Box2>& boxes) {
   }
 }
 
-int OccluderGrid::Column(double x) const { return CellIndex((x - bounds_.min.x) / cellWidth_, columns_); }
+int BoxGrid::Column(double x) const { return CellIndex((x - bounds_.min.x) / cellWidth_, columns_); }
 
-int OccluderGrid::Row(double y) const { return CellIndex((y - bounds_.min.y) / cellHeight_, rows_); }
+int BoxGrid::Row(double y) const { return CellIndex((y - bounds_.min.y) / cellHeight_, rows_); }
 
 }  // namespace wb::draft

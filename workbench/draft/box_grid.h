@@ -1,4 +1,5 @@
-// A uniform grid over the view plane that finds the occluders whose boxes a segment may cross.
+// A uniform grid over the view plane that finds the boxes a segment may cross: occluders in
+// hidden-line removal, strokes in the line clean-ups.
 #pragma once
 
 #include <algorithm>
@@ -10,14 +11,14 @@
 
 namespace wb::draft {
 
-class OccluderGrid {
+class BoxGrid {
  public:
-  OccluderGrid() = default;
-  // One box per occluder; about one cell per occluder keeps both the lists and the walk short.
-  explicit OccluderGrid(const std::vector<Box2>& boxes);
+  BoxGrid() = default;
+  // About one cell per box keeps both the cell lists and the walk short.
+  explicit BoxGrid(const std::vector<Box2>& boxes);
 
-  // Calls visit(index) for the occluders listed in every cell the segment from a to b, widened
-  // by margin, passes; an occluder in several cells comes once per cell. Stops when visit
+  // Calls visit(index) for the boxes listed in every cell the segment from a to b, widened by
+  // margin, passes; a box in several cells comes once per cell. Stops when visit
   // answers false.
   template <typename Visit>
   void ForEachAlong(Point2 a, Point2 b, double margin, Visit visit) const;
@@ -36,7 +37,7 @@ class OccluderGrid {
 };
 
 template <typename Visit>
-void OccluderGrid::ForEachAlong(Point2 a, Point2 b, double margin, Visit visit) const {
+void BoxGrid::ForEachAlong(Point2 a, Point2 b, double margin, Visit visit) const {
   if (columns_ == 0) return;
   if (std::max(a.x, b.x) + margin < bounds_.min.x || std::min(a.x, b.x) - margin > bounds_.max.x ||
       std::max(a.y, b.y) + margin < bounds_.min.y || std::min(a.y, b.y) - margin > bounds_.max.y) {
