@@ -255,7 +255,8 @@ bool Save2D(const std::string& target, std::uint8_t autoClip, std::uint8_t overw
   // settings are put back all the same.
   const bool merged = Run("merge_save2d_files") == host::kOk;
   RestoreRewriteSwitch();
-  if (autoClip != 0) Run("AutoClip");
+  // Clipping after a failed merge would rewrite the old drawing the failure left in place.
+  if (autoClip != 0 && merged) Run("AutoClip");
   RestoreLineCleanup();
   if (preserve) {
     UnblankAfterGeneration();

@@ -1,6 +1,7 @@
 // Name lookup over the command families.
 #include "workbench/command_table.h"
 
+#include <exception>
 #include <initializer_list>
 #include <string_view>
 #include <unordered_map>
@@ -22,7 +23,12 @@ CommandMap BuildMap(std::initializer_list<std::span<const NamedCommand>> familie
 std::optional<host::Status> Run(const CommandMap& map, std::string_view name) {
   const auto found = map.find(name);
   if (found == map.end()) return std::nullopt;
-  return found->second();
+  // Nothing is thrown across the host boundary: a command that fails answers 0.
+  try {
+    return found->second();
+  } catch (const std::exception&) {
+    return host::Status{0};
+  }
 }
 
 }  // namespace

@@ -5,6 +5,7 @@
 #include <cmath>
 #include <cstdlib>
 #include <filesystem>
+#include <system_error>
 
 #include "shell/host/argument_blocks.h"
 #include "workbench/command_table.h"
@@ -125,7 +126,8 @@ host::Status MergeSources() {
 host::Status AutoClip() {
   const std::string target = LongName(kTargetKind);
   const std::filesystem::path dxf = target + ".dxf";
-  if (target.empty() || !std::filesystem::exists(dxf)) return 0;
+  std::error_code error;
+  if (target.empty() || !std::filesystem::exists(dxf, error)) return 0;
   try {
     draft::Sheet sheet = draft::ReadDxfSheet(dxf);
     const std::array<double, 4>& window = Workbench::Get().View().window;

@@ -1,11 +1,11 @@
 // Helpers of the 2D pipeline tests.
 #include "tests/draft/draft_fixture.h"
 
+#include <algorithm>
 #include <cmath>
 #include <sstream>
 
 namespace draft_test {
-
 namespace {
 
 wb::Entity& AddEntity(wb::Drawing& drawing, std::uint8_t type, std::uint8_t layer, std::uint8_t color) {
@@ -15,18 +15,10 @@ wb::Entity& AddEntity(wb::Drawing& drawing, std::uint8_t type, std::uint8_t laye
   return entity;
 }
 
-bool Near(Point2 p, Point2 q, double tolerance) { return std::hypot(p.x - q.x, p.y - q.y) <= tolerance; }
-
 bool Matches(const Stroke& stroke, const Expected& expected, double tolerance) {
-  if (stroke.kind != expected.kind) return false;
-  return (Near(stroke.a, expected.a, tolerance) && Near(stroke.b, expected.b, tolerance)) ||
-         (Near(stroke.a, expected.b, tolerance) && Near(stroke.b, expected.a, tolerance));
-}
-
-std::string Describe(Point2 a, Point2 b, StrokeKind kind) {
-  std::ostringstream text;
-  text << "(" << a.x << ", " << a.y << ")-(" << b.x << ", " << b.y << ") kind " << static_cast<int>(kind);
-  return text.str();
+  const auto near = [&](Point2 p, Point2 q) { return std::hypot(p.x - q.x, p.y - q.y) <= tolerance; };
+  return stroke.kind == expected.kind && ((near(stroke.a, expected.a) && near(stroke.b, expected.b)) ||
+                                          (near(stroke.a, expected.b) && near(stroke.b, expected.a)));
 }
 
 }  // namespace
@@ -48,27 +40,36 @@ wb::Entity& AddLine(wb::Drawing& drawing, host::Point3f start, host::Point3f end
   return entity;
 }
 
+wb::draft::GenerateOptions ViewOf(host::Point3f eye, host::Point3f target, bool perspective, bool hideHiddenLines) {
+  wb::draft::GenerateOptions options;
+  options.view = {eye, target, perspective};
+  options.hideHiddenLines = hideHiddenLines;
+  return options;
+}
+
 ::testing::AssertionResult SameStrokes(const std::vector<Stroke>& actual, std::vector<Expected> expected,
                                        double tolerance) {
   std::ostringstream problems;
+  const auto describe = [&](const char* what, Point2 a, Point2 b, StrokeKind kind) {
+    problems << "\n  " << what << " (" << a.x << ", " << a.y << ")-(" << b.x << ", " << b.y << ") kind "
+             << static_cast<int>(kind);
+  };
   for (const Stroke& stroke : actual) {
     auto match = std::find_if(expected.begin(), expected.end(),
                               [&](const Expected& candidate) { return Matches(stroke, candidate, tolerance); });
     if (match == expected.end()) {
-      problems << "\n  unexpected " << Describe(stroke.a, stroke.b, stroke.kind);
+      describe("unexpected", stroke.a, stroke.b, stroke.kind);
     } else {
       expected.erase(match);
     }
   }
-  for (const Expected& missing : expected) problems << "\n  missing " << Describe(missing.a, missing.b, missing.kind);
+  for (const Expected& missing : expected) describe("missing", missing.a, missing.b, missing.kind);
   if (problems.str().empty()) return ::testing::AssertionSuccess();
   return ::testing::AssertionFailure() << problems.str();
 }
 
-bool AllFinite(const wb::draft::Sheet& sheet) {
-  return std::all_of(sheet.strokes.begin(), sheet.strokes.end(), [](const Stroke& s) {
-    return std::isfinite(s.a.x) && std::isfinite(s.a.y) && std::isfinite(s.b.x) && std::isfinite(s.b.y);
-  });
+long CountMatching(const std::vector<Stroke>& strokes, const Expected& expected, double tolerance) {
+  return std::count_if(strokes.begin(), strokes.end(), [&](const Stroke& s) { return Matches(s, expected, tolerance); });
 }
 
 }  // namespace draft_test

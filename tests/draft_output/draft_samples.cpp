@@ -5,47 +5,30 @@
 #include <sstream>
 
 namespace draft_output_samples {
-namespace {
 
-using wb::draft::Label;
 using wb::draft::Sheet;
-using wb::draft::Stroke;
 using wb::draft::StrokeKind;
 
-// Pieces that read back exactly: cp1252 letters, characters written as \U+ escapes, percent
-// runs and backslashes that the encoding escapes.
-const std::vector<std::string> kTextPieces = {"Wall", " ", "Schnitt A-A", "Wände", "€ 12", "日本", "50%",
-                                             "%%c", "%%%", "C:\\Users", "\\U+0041", "<&\"'>", "ø 12", "Ω"};
-
-}  // namespace
-
 Sheet MakeSheet(unsigned seed, int strokes, int labels, int layers) {
+  // Code page letters, characters written as \U+ escapes, and what the encoding escapes.
+  static const std::vector<std::string> pieces = {"Wall", " ",    "Schnitt A-A", "Wände", "€ 12",  "日本", "50%",
+                                                  "%%c",  "%%%", "C:\\Users",    "\\U+0041", "<&\"'>", "ø 12", "Ω"};
   std::mt19937 random(seed);
   std::uniform_real_distribution<double> coordinate(-20000.0, 20000.0);
-  std::uniform_int_distribution<int> layer(0, layers - 1);
-  std::uniform_int_distribution<int> color(0, 255);
-  std::uniform_int_distribution<int> kind(0, 2);
-  std::uniform_int_distribution<std::size_t> piece(0, kTextPieces.size() - 1);
+  const auto below = [&](int limit) { return std::uniform_int_distribution<int>(0, limit - 1)(random); };
+  const auto byte = [&](int limit) { return static_cast<std::uint8_t>(below(limit)); };
   Sheet sheet;
   for (int i = 0; i < layers; i += 2) sheet.layerNames[static_cast<std::size_t>(i)] = "Level " + std::to_string(i) + " Ä";
+  // Braced lists evaluate left to right, so the same seed draws the same values.
   for (int i = 0; i < strokes; ++i) {
-    Stroke stroke;
-    stroke.a = {coordinate(random), coordinate(random)};
-    stroke.b = {coordinate(random), coordinate(random)};
-    stroke.layer = static_cast<std::uint8_t>(layer(random));
-    stroke.color = static_cast<std::uint8_t>(color(random));
-    stroke.kind = static_cast<StrokeKind>(kind(random));
-    sheet.strokes.push_back(stroke);
+    sheet.strokes.push_back({{coordinate(random), coordinate(random)}, {coordinate(random), coordinate(random)},
+                             byte(layers), byte(256), static_cast<StrokeKind>(below(3))});
   }
   for (int i = 0; i < labels; ++i) {
-    Label label;
-    label.at = {coordinate(random), coordinate(random)};
-    label.height = 0.5 + std::uniform_real_distribution<double>(0.0, 10.0)(random);
-    label.angle = std::uniform_real_distribution<double>(-360.0, 360.0)(random);
-    for (int k = 0; k < 4; ++k) label.text += kTextPieces[piece(random)];
-    label.layer = static_cast<std::uint8_t>(layer(random));
-    label.color = static_cast<std::uint8_t>(color(random));
-    sheet.labels.push_back(label);
+    std::string text;
+    for (int k = 0; k < 4; ++k) text += pieces[static_cast<std::size_t>(below(static_cast<int>(pieces.size())))];
+    sheet.labels.push_back({{coordinate(random), coordinate(random)}, 5.5 + coordinate(random) / 4000,
+                            coordinate(random) / 50, text, byte(layers), byte(256)});
   }
   return sheet;
 }
@@ -57,8 +40,8 @@ Sheet MakeOddNamesSheet() {
   Sheet sheet;
   for (std::size_t i = 0; i < names.size(); ++i) {
     sheet.layerNames[i] = names[i];
-    sheet.strokes.push_back({{0.0, static_cast<double>(i)}, {10.0, static_cast<double>(i)},
-                             static_cast<std::uint8_t>(i), 7, StrokeKind::Edge});
+    const double y = static_cast<double>(i);
+    sheet.strokes.push_back({{0.0, y}, {10.0, y}, static_cast<std::uint8_t>(i), 7, StrokeKind::Edge});
   }
   sheet.labels.push_back({{0.0, -5.0}, 2.5, 0.0, "odd layers", 4, 2});
   return sheet;

@@ -1,66 +1,44 @@
-// The child takes its lock, reports one byte and blocks reading a pipe; the parent closing its
-// end is the signal to exit. The child leaves with _exit so that nothing of the test runner's
-// state (at-exit handlers, buffered output) runs twice.
+// The child locks, reports, and waits to be killed; it never returns into the test runner.
 #include "tests/draft_output/locking_child.h"
 
 #include <fcntl.h>
+#include <signal.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <optional>
 #include <stdexcept>
 
 #include "workbench/draft/file_lock.h"
 
 namespace draft_output_samples {
-namespace {
-
-void HoldUntilReleased(int report, int release) {
-  const char ready = 'y';
-  if (write(report, &ready, 1) != 1) _exit(2);
-  char ignored;
-  while (read(release, &ignored, 1) > 0) {
-  }
-}
-
-[[noreturn]] void RunChild(const std::filesystem::path& path, LockingChild::Lock lock, int report, int release) {
-  using wb::draft::FileLockGuard;
-  try {
-    if (lock == LockingChild::Lock::RecordLock) {
-      const int fd = open(path.c_str(), O_RDWR);
-      struct flock range {};
-      range.l_type = F_WRLCK;
-      range.l_whence = SEEK_SET;
-      if (fd < 0 || fcntl(fd, F_SETLK, &range) != 0) _exit(1);
-      HoldUntilReleased(report, release);
-    } else {
-      const FileLockGuard guard(path, lock == LockingChild::Lock::SharedGuard ? FileLockGuard::Mode::Shared
-                                                                             : FileLockGuard::Mode::Exclusive);
-      HoldUntilReleased(report, release);
-    }
-  } catch (...) {
-    _exit(1);
-  }
-  _exit(0);
-}
-
-}  // namespace
 
 LockingChild::LockingChild(const std::filesystem::path& path, Lock lock) {
+  using wb::draft::FileLockGuard;
   int report[2];
-  int release[2];
-  if (pipe2(report, O_CLOEXEC) != 0 || pipe2(release, O_CLOEXEC) != 0) throw std::runtime_error("no pipes");
+  if (pipe2(report, O_CLOEXEC) != 0) throw std::runtime_error("no pipe");
   pid_ = fork();
   if (pid_ < 0) throw std::runtime_error("cannot fork");
   if (pid_ == 0) {
-    close(report[0]);
-    close(release[1]);
-    RunChild(path, lock, report[1], release[0]);
+    try {
+      std::optional<FileLockGuard> guard;
+      struct flock range {};
+      range.l_type = F_WRLCK;
+      if (lock != Lock::RecordLock) {
+        guard.emplace(path, lock == Lock::SharedGuard ? FileLockGuard::Mode::Shared : FileLockGuard::Mode::Exclusive);
+      } else if (fcntl(open(path.c_str(), O_RDWR), F_SETLK, &range) != 0) {
+        _exit(1);
+      }
+      if (write(report[1], "y", 1) == 1) {
+        for (;;) pause();
+      }
+    } catch (...) {
+    }
+    _exit(1);
   }
   close(report[1]);
-  close(release[0]);
-  toChild_ = release[1];
   char ready = 'n';
-  const bool holds = read(report[0], &ready, 1) == 1 && ready == 'y';
+  const bool holds = read(report[0], &ready, 1) == 1;
   close(report[0]);
   if (!holds) {
     Release();
@@ -72,9 +50,8 @@ LockingChild::~LockingChild() { Release(); }
 
 void LockingChild::Release() {
   if (pid_ <= 0) return;
-  close(toChild_);
-  int status = 0;
-  waitpid(pid_, &status, 0);
+  kill(pid_, SIGKILL);
+  waitpid(pid_, nullptr, 0);
   pid_ = -1;
 }
 

@@ -19,12 +19,11 @@ class LockingChild {
   LockingChild(const LockingChild&) = delete;
   LockingChild& operator=(const LockingChild&) = delete;
 
-  // The child exits, which is what drops its lock; returns when it is gone.
+  // The child ends, which is what drops its lock; returns when it is gone.
   void Release();
 
  private:
   pid_t pid_ = -1;
-  int toChild_ = -1;
 };
 
 }  // namespace draft_output_samples

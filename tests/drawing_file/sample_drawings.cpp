@@ -6,13 +6,14 @@
 #include <limits>
 #include <random>
 #include <string>
+#include <type_traits>
 #include <vector>
 
 namespace drawing_file_samples {
 namespace {
 
 using wb::Attribute;
-using wb::AttributeType;
+using Type = wb::AttributeType;
 using wb::Drawing;
 using wb::Entity;
 
@@ -23,49 +24,19 @@ void SetHeader(Entity& entity, std::uint8_t layer, std::uint8_t color, bool hidd
   entity.header.bytes[host::kHeaderByte8] = static_cast<std::uint8_t>(layer ^ color);
 }
 
-Attribute Named(const char* name, AttributeType type, std::int16_t format = 0) {
+// An attribute of the given type with `value` in the member that type keeps it in.
+template <typename Value>
+Attribute Make(const char* name, Type type, Value Attribute::*member, std::type_identity_t<Value> value,
+               std::int16_t format = 0) {
   Attribute attribute;
   attribute.name = name;
   attribute.type = type;
   attribute.format = format;
+  attribute.*member = std::move(value);
   return attribute;
 }
 
-Attribute Text(const char* name, std::string value) {
-  Attribute attribute = Named(name, AttributeType::String);
-  attribute.text = std::move(value);
-  return attribute;
-}
-
-Attribute Short(const char* name, std::int16_t value) {
-  Attribute attribute = Named(name, AttributeType::Short);
-  attribute.shortValue = value;
-  return attribute;
-}
-
-Attribute Float(const char* name, float value, std::int16_t format) {
-  Attribute attribute = Named(name, AttributeType::Float, format);
-  attribute.floatValue = value;
-  return attribute;
-}
-
-Attribute Floats(const char* name, std::vector<float> values, std::int16_t format) {
-  Attribute attribute = Named(name, AttributeType::FloatVector, format);
-  attribute.floats = std::move(values);
-  return attribute;
-}
-
-Attribute Shorts(const char* name, std::vector<std::int16_t> values) {
-  Attribute attribute = Named(name, AttributeType::ShortVector);
-  attribute.shorts = std::move(values);
-  return attribute;
-}
-
-Attribute Longs(const char* name, std::vector<std::int32_t> values) {
-  Attribute attribute = Named(name, AttributeType::LongVector);
-  attribute.longs = std::move(values);
-  return attribute;
-}
+Attribute Text(const char* name, std::string value) { return Make(name, Type::String, &Attribute::text, value); }
 
 host::LineRecord Line(float x, float y, float length) {
   return {.lineType = 1, .color = 7, .width = 2, .unused = 0, .start = {x, y, 0.0F}, .end = {x + length, y, 3.0F}};
@@ -136,14 +107,15 @@ Drawing MakeDrawingWithEverything() {
   entity->elementName = "Camera 1";
   entity->attributes = {
       Text("@Class=", "Camera"),
-      Short("mode=", -32768),
-      Float("fov=", 47.5F, 3),
-      Float("zero=", -0.0F, -1),
-      Float("far=", std::numeric_limits<float>::infinity(), 0),
-      Floats("eye=", {1.0F, -2.0F, 1.7F}, 2),
-      Floats("empty=", {}, 0),
-      Shorts("flags=", {0, 1, -1, 32767}),
-      Longs("ids=", {std::numeric_limits<std::int32_t>::min(), 0, 42, std::numeric_limits<std::int32_t>::max()}),
+      Make("mode=", Type::Short, &Attribute::shortValue, -32768),
+      Make("fov=", Type::Float, &Attribute::floatValue, 47.5F, 3),
+      Make("zero=", Type::Float, &Attribute::floatValue, -0.0F, -1),
+      Make("far=", Type::Float, &Attribute::floatValue, std::numeric_limits<float>::infinity()),
+      Make("eye=", Type::FloatVector, &Attribute::floats, {1.0F, -2.0F, 1.7F}, 2),
+      Make("empty=", Type::FloatVector, &Attribute::floats, {}),
+      Make("flags=", Type::ShortVector, &Attribute::shorts, {0, 1, -1, 32767}),
+      Make("ids=", Type::LongVector, &Attribute::longs,
+           {std::numeric_limits<std::int32_t>::min(), 0, 42, std::numeric_limits<std::int32_t>::max()}),
       Text("note=", std::string("with a \0 inside", 15)),
   };
   SetHeader(*entity, 1, 250, false);
@@ -194,12 +166,14 @@ Drawing MakeBulkDrawing(std::size_t count, unsigned seed) {
       wb::WriteRecord(*entity, Element("CAM", coordinate(random)));
       entity->configPath = "/srv/library/Cameras";
       entity->elementName = "Camera " + std::to_string(i);
-      entity->attributes = {Text("@Class=", "Camera"),
-                            Floats("eye=", {coordinate(random), coordinate(random), 1.7F}, 2),
-                            Floats("target=", {coordinate(random), coordinate(random), 1.7F}, 2),
-                            Float("fov=", 50.0F, 3), Short("mode=", static_cast<std::int16_t>(kind)),
-                            Shorts("flags=", {1, 0, static_cast<std::int16_t>(kind)}),
-                            Longs("sections=", {static_cast<std::int32_t>(i), 7})};
+      entity->attributes = {
+          Text("@Class=", "Camera"),
+          Make("eye=", Type::FloatVector, &Attribute::floats, {coordinate(random), coordinate(random), 1.7F}, 2),
+          Make("target=", Type::FloatVector, &Attribute::floats, {coordinate(random), coordinate(random), 1.7F}, 2),
+          Make("fov=", Type::Float, &Attribute::floatValue, 50.0F, 3),
+          Make("mode=", Type::Short, &Attribute::shortValue, static_cast<std::int16_t>(kind)),
+          Make("flags=", Type::ShortVector, &Attribute::shorts, {1, 0, static_cast<std::int16_t>(kind)}),
+          Make("sections=", Type::LongVector, &Attribute::longs, {static_cast<std::int32_t>(i), 7})};
     } else if (kind < 86) {
       entity = &drawing.Add(host::kTypeGroup);
       wb::WriteRecord(*entity, host::GroupRecord{.kind = kind, .reserved = {}});

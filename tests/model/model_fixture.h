@@ -32,32 +32,24 @@ class ModelTest : public ::testing::Test {
   static host::DatabaseHandle Database() { return Bench().Current(); }
   static wb::Drawing& Drawing() { return Bench().CurrentDrawing(); }
   static wb::Entity* Find(host::EntityHandle entity) { return Drawing().Find(entity); }
-
-  // An entity of the given host type put straight into the current drawing.
   static host::EntityHandle AddEntity(std::uint8_t type) { return Drawing().Add(type).handle; }
 
   static void AddStringAttribute(host::EntityHandle entity, const std::string& name, const std::string& text) {
     wb::Attribute& attribute = Find(entity)->attributes.emplace_back();
     attribute.name = name;
-    attribute.type = wb::AttributeType::String;
     attribute.text = text;
   }
-
   static const wb::Attribute* AttributeOf(host::EntityHandle entity, const std::string& name) {
     const wb::Entity* found = Find(entity);
     return found == nullptr ? nullptr : found->FindAttribute(name.c_str());
   }
-
   static std::string StringAttribute(host::EntityHandle entity, const std::string& name) {
     const wb::Attribute* attribute = AttributeOf(entity, name);
     return attribute == nullptr ? std::string("<absent>") : attribute->text;
   }
 
-  static void FailNext(const std::string& call, std::int32_t result = 0) {
-    Bench().GetFaults().FailNext(call, result);
-  }
-
-  static void FailAttribute(const std::string& call, const std::string& attribute, std::int32_t result = 0) {
+  // The next call of `call` (only its writes of `attribute`, when given) answers `result`.
+  static void FailNext(const std::string& call, std::int32_t result = 0, const std::string& attribute = "") {
     wb::FaultRule rule;
     rule.call = call;
     rule.attribute = attribute;

@@ -1,4 +1,5 @@
-// The entity factory: which class wraps which entity, and what the caller receives.
+// The wrapper classes side by side: what each creates and deletes, and which class the entity
+// factory picks for an entity.
 #include "model/wrap_entity.h"
 
 #include <typeinfo>
@@ -22,93 +23,80 @@ const std::type_info& ClassOf(const std::unique_ptr<HRPrimitive>& object) {
   return typeid(wrapper);
 }
 
-TEST_F(WrapEntityTest, EachWrappedTypeGetsItsClassAndIsRead) {
+// Owners rename a wrapper before creating it, so that the marker names the owner.
+std::unique_ptr<HRPrimitive> Renamed(std::unique_ptr<HRPrimitive> wrapper, const char* className) {
+  wrapper->SetClassName(className);
+  return wrapper;
+}
+
+TEST_F(WrapEntityTest, EveryCreatedEntityIsMarkedWrapsBackIntoItsClassAndDeletes) {
   struct Case {
+    std::unique_ptr<HRPrimitive> wrapper;
+    const char* className;
+    const char* name;  // the host's entity name
     std::uint8_t type;
-    const std::type_info& wrapper;
+    bool recordsRemoval;
+    bool keepsHandle;
   };
-  const Case cases[] = {
-      {host::kTypeLine, typeid(HRLine)},          {host::kTypeElement, typeid(HRPlacedObject)},
-      {host::kTypeGroup, typeid(HRGroup)},        {host::kTypeBlock, typeid(HRBlock)},
-      {host::kTypePlacedBlock, typeid(HRPlacedBlock)},
-  };
-  for (const Case& c : cases) {
-    const host::EntityHandle entity = AddEntity(c.type);
-    std::unique_ptr<HRPrimitive> object;
-    EXPECT_EQ(WrapEntity(Database(), entity, object), 0) << int{c.type};
-    ASSERT_NE(object, nullptr);
-    EXPECT_EQ(ClassOf(object), c.wrapper) << int{c.type};
-    EXPECT_EQ(object->GetEntity(), entity) << int{c.type};
-    EXPECT_EQ(object->GetEntityType(), c.type);
+  Case cases[] = {{std::make_unique<HRLine>(), "HRLine", "", host::kTypeLine, true, false},
+                  {std::make_unique<HRText>(), "HRText", "", host::kTypeLine, true, true},
+                  {std::make_unique<HRBlock>(), "HRBlock", "blk", host::kTypeBlock, true, false},
+                  {std::make_unique<HRGroup>(), "HRGroup", "grp", host::kTypeGroup, false, false},
+                  {Renamed(std::make_unique<HRGroup>(), "hrSecCam"), "hrSecCam", "grp", host::kTypeGroup, false, false},
+                  {std::make_unique<HRPlacedBlock>(), "HRPlacedBlock", "blk", host::kTypePlacedBlock, true, false},
+                  {std::make_unique<HRPlacedObject>(), "HRPlacedObject", "", host::kTypeElement, true, false}};
+  for (Case& c : cases) {
+    SCOPED_TRACE(c.className);
+    ASSERT_EQ(c.wrapper->Create(), 0);
+    const host::EntityHandle entity = c.wrapper->GetEntity();
+    EXPECT_EQ(StringAttribute(entity, "@Class="), c.className);
+    EXPECT_EQ(Find(entity)->name, c.name);
+    std::unique_ptr<HRPrimitive> wrapped;
+    EXPECT_EQ(WrapEntity(Database(), entity, wrapped), 0);
+    EXPECT_EQ(ClassOf(wrapped), ClassOf(c.wrapper));
+    EXPECT_EQ(wrapped->GetEntity(), entity);
+    EXPECT_EQ(wrapped->GetEntityType(), c.type);
+
+    ClearJournal();
+    EXPECT_EQ(c.wrapper->Delete(), 0);
+    EXPECT_EQ(Find(entity), nullptr);
+    EXPECT_EQ(c.wrapper->IsStored(), c.keepsHandle);
+    EXPECT_EQ(ChangeRecords(), std::vector<ChangeRecord>(c.recordsRemoval ? 1U : 0U, ChangeRecord(entity, 2)));
   }
 }
 
-TEST_F(WrapEntityTest, LinesWithATextBlockBecomeTexts) {
-  HRText created;
-  created.SetText("label");
-  ASSERT_EQ(created.Create(), 0);
+TEST_F(WrapEntityTest, PointsAreWrappedUnreadAndOtherTypesAsAnUnreadUnknownWithMinus4) {
+  const host::EntityHandle point = AddEntity(host::kTypePoint);
   std::unique_ptr<HRPrimitive> object;
-  EXPECT_EQ(WrapEntity(Database(), created.GetEntity(), object), 0);
-  const auto* text = dynamic_cast<const HRText*>(object.get());
-  ASSERT_NE(text, nullptr);
-  EXPECT_EQ(text->GetText(), "label");
-}
-
-TEST_F(WrapEntityTest, PointsAreWrappedButReadNothing) {
-  const host::EntityHandle entity = AddEntity(host::kTypePoint);
-  std::unique_ptr<HRPrimitive> object;
-  EXPECT_EQ(WrapEntity(Database(), entity, object), 0);
+  EXPECT_EQ(WrapEntity(Database(), point, object), 0);
   EXPECT_EQ(ClassOf(object), typeid(HRPoint));
   EXPECT_FALSE(object->IsStored());
-}
-
-TEST_F(WrapEntityTest, UnwrappedTypesGiveAnUnreadUnknownAndMinus4) {
-  const std::uint8_t unwrapped[] = {2, 3, 5, 6, 7, 9, 0, 13};
-  for (const std::uint8_t type : unwrapped) {
-    const host::EntityHandle entity = AddEntity(type);
-    std::unique_ptr<HRPrimitive> object = std::make_unique<HRLine>();
-    EXPECT_EQ(WrapEntity(Database(), entity, object), -4) << int{type};
-    ASSERT_NE(object, nullptr);
+  object->SetEntity(point);  // a point creates nothing, it only marks the entity it holds
+  EXPECT_EQ(object->Create(), 0);
+  EXPECT_EQ(Drawing().LiveCount(), 1U);
+  EXPECT_EQ(StringAttribute(point, "@Class="), "HRPoint");
+  for (const std::uint8_t type : std::initializer_list<std::uint8_t>{2, 3, 5, 6, 7, 9, 0, 13}) {
+    object = std::make_unique<HRLine>();
+    EXPECT_EQ(WrapEntity(Database(), AddEntity(type), object), -4) << int{type};
     EXPECT_EQ(ClassOf(object), typeid(HRUnknown)) << int{type};
-    EXPECT_FALSE(object->IsStored());
-    EXPECT_EQ(object->GetEntityType(), 0);
   }
 }
 
-TEST_F(WrapEntityTest, AnUnreadableHeaderGivesAnUnknownAndMinus4) {
+TEST_F(WrapEntityTest, AnUnreadableEntityGivesMinus4OrTheWrappersOwnReadResult) {
   std::unique_ptr<HRPrimitive> object;
   EXPECT_EQ(WrapEntity(Database(), 1234, object), -4);
   EXPECT_EQ(ClassOf(object), typeid(HRUnknown));
-
-  const host::EntityHandle entity = AddEntity(host::kTypeGroup);
-  FailNext("qel_read_entity_header");
-  EXPECT_EQ(WrapEntity(Database(), entity, object), -4);
-  EXPECT_EQ(ClassOf(object), typeid(HRUnknown));
-}
-
-TEST_F(WrapEntityTest, TheWrappersReadResultIsTheFactorysResult) {
-  const host::EntityHandle line = AddEntity(host::kTypeLine);
-  std::unique_ptr<HRPrimitive> object;
-  FailNext("qel_read_line");
-  EXPECT_EQ(WrapEntity(Database(), line, object), -17);
-  EXPECT_EQ(ClassOf(object), typeid(HRLine));
-
   const host::EntityHandle group = AddEntity(host::kTypeGroup);
-  FailNext("qel_read_group");
+  FailNext("qel_read_entity_header");
   EXPECT_EQ(WrapEntity(Database(), group, object), -4);
-  EXPECT_EQ(ClassOf(object), typeid(HRGroup));
-}
-
-TEST_F(WrapEntityTest, ReadsFromTheGivenDatabase) {
-  wb::Drawing other;
+  EXPECT_EQ(ClassOf(object), typeid(HRUnknown));
+  FailNext("qel_read_line");
+  EXPECT_EQ(WrapEntity(Database(), AddEntity(host::kTypeLine), object), -17);
+  EXPECT_EQ(ClassOf(object), typeid(HRLine));
+  wb::Drawing other;  // the given database, not the current one, is read: its entity 2 is a group
   other.Add(host::kTypeArc);
   other.Add(host::kTypeGroup);
-  const host::DatabaseHandle otherDatabase = Bench().Open(std::move(other));
-  AddEntity(host::kTypeLine);
-  AddEntity(host::kTypeLine);
-  std::unique_ptr<HRPrimitive> object;
-  EXPECT_EQ(WrapEntity(otherDatabase, 2, object), 0);
-  EXPECT_EQ(ClassOf(object), typeid(HRGroup));
+  EXPECT_EQ(WrapEntity(Bench().Open(std::move(other)), 2, object), 0);
 }
 
 }  // namespace

@@ -20,25 +20,21 @@
 
 namespace {
 
-CameraSettings TopView() {
+// Straight down onto the house, replacing the earlier file unless told otherwise.
+void AddTopView(const std::string& name, std::int16_t displayMode, std::uint8_t overwrite, std::uint8_t preserve) {
   CameraSettings settings;
   settings.eye[0] = settings.target[0] = 5.0F;
   settings.eye[1] = settings.target[1] = 4.0F;
   settings.eye[2] = 30.0F;
   settings.cone = 45.0F;
-  settings.viewWindow[0] = -8.0;
-  settings.viewWindow[1] = -6.0;
-  settings.viewWindow[2] = 8.0;
-  settings.viewWindow[3] = 6.0;
+  const double window[4] = {-8.0, -6.0, 8.0, 6.0};
+  std::copy(window, window + 4, settings.viewWindow);
   settings.viewMode = HRCamera::k3DParallel;
+  settings.displayMode = displayMode;
   settings.layers.fill(1);
-  settings.overwrite2D = 1;
-  settings.removeCoincident = 1;
-  settings.lineMerge = 1;
-  return settings;
-}
-
-void AddTickedCamera(const std::string& name, const CameraSettings& settings) {
+  settings.overwrite2D = overwrite;
+  settings.removeCoincident = settings.lineMerge = 1;
+  settings.preserveText = settings.preserveDimensions = preserve;
   HRCamera camera;
   camera.SetSettings(settings);
   camera.SetName(name);
@@ -49,11 +45,10 @@ void AddTickedCamera(const std::string& name, const CameraSettings& settings) {
 void RunBatch(const std::filesystem::path& drawing) {
   const host::DatabaseHandle database = wb::Workbench::Get().Current();
   wb::Workbench::Get().SetDrawingPath(database, drawing.string());
-  HRUtility::Build2DBatch batch(HRUtility::BuildMode::All, CollectSectionHandles(database),
-                                CollectPlanHandles(database));
-  const HRUtility::BuildResult result = batch.Run();
-  if (!result.AllSaved()) throw std::runtime_error("the batch saved " + std::to_string(result.Saved()) + " of " +
-                                                   std::to_string(result.total) + " views");
+  const HRUtility::BuildResult result =
+      HRUtility::Build2DBatch(HRUtility::BuildMode::All, CollectSectionHandles(database), CollectPlanHandles(database))
+          .Run();
+  if (!result.AllSaved()) throw std::runtime_error("the batch saved " + std::to_string(result.Saved()) + " views");
 }
 
 // The audit looks at one folder: the files move up out of the 2D folder.
@@ -88,22 +83,13 @@ int main(int argc, char** argv) {
     bench.LoadPlugin({pandex::kExports.attach, pandex::kExports.detach, pandex::kExports.entry});
     SetDatabase(bench.Current());
     samples::BuildSampleHouse();
-
-    CameraSettings kept = TopView();
-    kept.preserveText = kept.preserveDimensions = 1;
-    AddTickedCamera("Kept texts", kept);
-    CameraSettings merged = TopView();
-    merged.overwrite2D = 0;
-    merged.displayMode = 2;  // hidden lines, merged into the first run's drawing
-    AddTickedCamera("Merged", merged);
-    AddTickedCamera("../odd: name*?\t", TopView());
-
+    AddTopView("Kept texts", 0, 1, 1);
+    AddTopView("Merged", 2, 0, 0);  // hidden lines, merged into the first run's drawing
+    AddTopView("../odd: name*?\t", 0, 1, 0);
     // The second run replaces every file but the merged one, which holds both runs.
-    const std::filesystem::path drawing = folder / "house.pdx";
-    RunBatch(drawing);
-    RunBatch(drawing);
+    RunBatch(folder / "house.pdx");
+    RunBatch(folder / "house.pdx");
     bench.UnloadPlugin();
-
     ListOutput(folder / "2D_", folder);
     std::filesystem::remove_all(folder / "2D_");
     std::filesystem::remove_all(folder / "host");

@@ -3,10 +3,17 @@
 #pragma once
 
 #include <gtest/gtest.h>
+#include <unistd.h>
 
+#include <algorithm>
+#include <array>
+#include <cmath>
 #include <cstdint>
 #include <filesystem>
+#include <initializer_list>
+#include <sstream>
 #include <string>
+#include <tuple>
 #include <utility>
 #include <vector>
 
@@ -16,6 +23,7 @@
 #include "views/camera_settings.h"
 #include "views/hr_camera.h"
 #include "views/hr_camera_mgr.h"
+#include "views/hr_plane.h"
 #include "views/hr_section.h"
 #include "workbench/drawing_file.h"
 #include "workbench/workbench.h"
@@ -23,7 +31,7 @@
 class ViewsTest : public ::testing::Test {
  protected:
   using ChangeRecord = std::pair<host::EntityHandle, std::int32_t>;
-  using Kind = wb::JournalEntry::Kind;
+  using StepList = std::vector<std::string>;
 
   void SetUp() override {
     Bench().Reset();
@@ -38,12 +46,13 @@ class ViewsTest : public ::testing::Test {
     EXPECT_EQ(Bench().Memory().Outstanding(), 0) << "host memory was not released";
     EXPECT_EQ(Bench().Memory().BadReleases(), 0);
     std::error_code ignored;
-    if (!savedFile_.empty()) std::filesystem::remove_all(savedFile_.parent_path(), ignored);
+    if (!folder_.empty()) std::filesystem::remove_all(folder_, ignored);
   }
 
   static wb::Workbench& Bench() { return wb::Workbench::Get(); }
   static wb::Drawing& Drawing() { return Bench().CurrentDrawing(); }
   static wb::Entity* Find(host::EntityHandle entity) { return Drawing().Find(entity); }
+  static std::uint8_t& Flags(host::EntityHandle entity) { return Find(entity)->header.bytes[host::kHeaderFlags]; }
   static const wb::Attribute* AttributeOf(host::EntityHandle entity, const std::string& name) {
     const wb::Entity* found = Find(entity);
     return found == nullptr ? nullptr : found->FindAttribute(name.c_str());
@@ -52,150 +61,95 @@ class ViewsTest : public ::testing::Test {
   static void DropAttribute(host::EntityHandle entity, const std::string& name) {
     std::erase_if(Find(entity)->attributes, [&](const wb::Attribute& a) { return a.name == name; });
   }
-  static void PutLongs(host::EntityHandle entity, const std::string& name, std::vector<std::int32_t> values) {
+  // Replaces a key with a fresh one of the given type, for the caller to fill in.
+  static wb::Attribute& Put(host::EntityHandle entity, const std::string& name, wb::AttributeType type) {
     DropAttribute(entity, name);
     wb::Attribute& attribute = Find(entity)->attributes.emplace_back();
     attribute.name = name;
-    attribute.type = wb::AttributeType::LongVector;
-    attribute.longs = std::move(values);
+    attribute.type = type;
+    return attribute;
   }
   static void PutString(host::EntityHandle entity, const std::string& name, const std::string& text) {
-    DropAttribute(entity, name);
-    wb::Attribute& attribute = Find(entity)->attributes.emplace_back();
-    attribute.name = name;
-    attribute.type = wb::AttributeType::String;
-    attribute.text = text;
-  }
-  static void PutShort(host::EntityHandle entity, const std::string& name, std::int16_t value) {
-    DropAttribute(entity, name);
-    wb::Attribute& attribute = Find(entity)->attributes.emplace_back();
-    attribute.name = name;
-    attribute.type = wb::AttributeType::Short;
-    attribute.shortValue = value;
+    Put(entity, name, wb::AttributeType::String).text = text;
   }
 
   static const wb::Journal& Log() { return Bench().GetJournal(); }
   static void ClearJournal() { Bench().GetJournal().Clear(); }
   static std::vector<ChangeRecord> ChangeRecords() { return Log().ChangeRecords(); }
   // Commands and overlays in the order the host ran them; overlays carry an "overlay " prefix.
-  static std::vector<std::string> Steps() {
-    std::vector<std::string> steps;
+  static StepList Steps() {
+    StepList steps;
     for (const wb::JournalEntry& entry : Log().Entries()) {
-      if (entry.kind == Kind::Command) steps.push_back(entry.name);
-      if (entry.kind == Kind::Overlay) steps.push_back("overlay " + entry.name);
+      if (entry.kind == wb::JournalEntry::Kind::Command) steps.push_back(entry.name);
+      if (entry.kind == wb::JournalEntry::Kind::Overlay) steps.push_back("overlay " + entry.name);
     }
     return steps;
   }
   // The attribute writes one entity received, in order.
-  static std::vector<std::string> WritesTo(host::EntityHandle entity) {
-    std::vector<std::string> names;
+  static StepList WritesTo(host::EntityHandle entity) {
+    StepList names;
     for (const wb::JournalEntry& entry : Log().Entries()) {
-      if (entry.kind == Kind::AttributeWrite && entry.entity == entity) names.push_back(entry.name);
+      if (entry.kind == wb::JournalEntry::Kind::AttributeWrite && entry.entity == entity) names.push_back(entry.name);
     }
     return names;
   }
-  static bool Journaled(Kind kind, const std::string& name) {
-    for (const wb::JournalEntry& entry : Log().Entries()) {
-      if (entry.kind == kind && entry.name == name) return true;
-    }
-    return false;
-  }
-
-  static void FailNext(const std::string& call, std::int32_t result = 0) { Bench().GetFaults().FailNext(call, result); }
-  // Fails every call of `call` on `attribute` (or command text), after letting `skip` pass.
-  static void FailOn(const std::string& call, const std::string& attribute, int times = -1, int skip = 0) {
-    wb::FaultRule rule;
-    rule.call = call;
-    rule.attribute = attribute;
-    rule.times = times;
-    rule.skip = skip;
-    Bench().GetFaults().Add(rule);
-  }
-  static void FailForEntity(const std::string& call, host::EntityHandle entity) {
-    wb::FaultRule rule;
-    rule.call = call;
-    rule.entity = entity;
-    rule.times = -1;
-    Bench().GetFaults().Add(rule);
+  static void FailNext(const std::string& call) { Bench().GetFaults().FailNext(call, 0); }
+  // Fails every call of `call` on `attribute` (or command text), or on one entity.
+  static void FailOn(const std::string& call, const std::string& attribute,
+                     host::EntityHandle entity = wb::FaultRule::kAnyEntity) {
+    Bench().GetFaults().Add({.call = call, .entity = entity, .attribute = attribute, .times = -1});
   }
 
   // Saves the current drawing to a file, opens that file as a new drawing and makes it the
-  // library's current database; answers the new database handle.
-  host::DatabaseHandle ReopenThroughFile() {
-    if (savedFile_.empty()) {
-      const std::filesystem::path folder =
-          std::filesystem::temp_directory_path() /
-          ("pandex_views_" + std::to_string(::testing::UnitTest::GetInstance()->random_seed()) + "_" +
-           ::testing::UnitTest::GetInstance()->current_test_info()->name());
-      std::filesystem::create_directories(folder);
-      savedFile_ = folder / "drawing.pdx";
-    }
-    wb::SaveDrawingFile(Drawing(), savedFile_);
-    const host::DatabaseHandle reopened = Bench().Open(wb::OpenDrawingFile(savedFile_));
+  // library's current database.
+  void ReopenThroughFile() {
+    folder_ =
+        std::filesystem::path(::testing::TempDir()) / ("pandex_views_" + std::to_string(::getpid()) + "_" +
+                                                       ::testing::UnitTest::GetInstance()->current_test_info()->name());
+    std::filesystem::create_directories(folder_);
+    wb::SaveDrawingFile(Drawing(), folder_ / "drawing.pdx");
+    const host::DatabaseHandle reopened = Bench().Open(wb::OpenDrawingFile(folder_ / "drawing.pdx"));
     Bench().SetCurrent(reopened);
     SetDatabase(reopened);
-    return reopened;
   }
 
   // A camera whose every value differs from the reset defaults, so that a value lost on the
   // way through a record shows.
   static CameraSettings DistinctSettings(float seed = 1.0F) {
-    CameraSettings settings;
-    settings.eye[0] = 10.5F * seed;
-    settings.eye[1] = -20.25F;
-    settings.eye[2] = 1.75F;
-    settings.target[0] = 3.0F;
-    settings.target[1] = 4.0F * seed;
-    settings.target[2] = -5.5F;
-    settings.cone = 37.5F;
-    settings.viewWindow[0] = -12.125;
-    settings.viewWindow[1] = -7.5;
-    settings.viewWindow[2] = 30.0 * seed;
-    settings.viewWindow[3] = 19.875;
+    CameraSettings settings{.eye = {10.5F * seed, -20.25F, 1.75F},
+                            .target = {3.0F, 4.0F * seed, -5.5F},
+                            .cone = 37.5F,
+                            .file2D = "plans\\ground floor.dxf",
+                            .comment = "north elevation"};
+    std::copy_n(std::array{-12.125, -7.5, 30.0 * seed, 19.875}.begin(), 4, settings.viewWindow);
     settings.displayMode = 4;
     settings.viewMode = HRCamera::k3DPerspective;
-    for (std::size_t i = 0; i < settings.layers.size(); ++i) settings.layers[i] = (i % 3 == 0) ? 1 : 0;
-    settings.file2D = "plans\\ground floor.dxf";
-    settings.comment = "north elevation";
-    settings.patterns = 1;
-    settings.showSections = 0;
-    settings.autoClip = 0;
-    settings.overwrite2D = 0;
-    settings.removeCoincident = 0;
-    settings.lineMerge = 0;
-    settings.scaleMode = 'f';
-    settings.preserveDimensions = 1;
-    settings.preserveText = 1;
-    settings.preserveWalls = 1;
+    for (std::size_t i = 0; i < settings.layers.size(); i += 3) settings.layers[i] = 1;
+    settings.patterns = settings.preserveDimensions = settings.preserveText = settings.preserveWalls = 1;
     settings.preserveLayer = 1;
+    settings.scaleMode = 'f';
     settings.preserveLayerIndex = 17;
     return settings;
   }
 
-  static void ExpectSameSettings(const CameraSettings& actual, const CameraSettings& expected) {
-    for (int i = 0; i < 3; ++i) {
-      EXPECT_EQ(actual.eye[i], expected.eye[i]) << "eye " << i;
-      EXPECT_EQ(actual.target[i], expected.target[i]) << "target " << i;
+  // Every value of a camera, to compare whole.
+  static auto Values(const CameraSettings& s) {
+    return std::tuple(
+        std::to_array(s.eye), std::to_array(s.target), s.cone, std::to_array(s.viewWindow), s.displayMode, s.viewMode,
+        s.scaleMode, s.file2D, s.comment, s.preserveLayerIndex,
+        std::array{+s.patterns, +s.showSections, +s.autoClip, +s.overwrite2D, +s.removeCoincident, +s.lineMerge,
+                   +s.preserveDimensions, +s.preserveText, +s.preserveWalls, +s.preserveLayer},
+        s.layers);
+  }
+
+  // Points rounded to a thousandth, so that a comparison does not depend on float arithmetic.
+  static std::string Rounded(std::initializer_list<host::Point3f> points) {
+    std::ostringstream out;
+    for (const host::Point3f& p : points) {
+      out << '(' << std::round(p.x * 1000) / 1000 + 0.0 << ' ' << std::round(p.y * 1000) / 1000 + 0.0 << ' '
+          << std::round(p.z * 1000) / 1000 + 0.0 << ')';
     }
-    EXPECT_EQ(actual.cone, expected.cone);
-    for (int i = 0; i < 4; ++i) EXPECT_DOUBLE_EQ(actual.viewWindow[i], expected.viewWindow[i]) << "window " << i;
-    EXPECT_EQ(actual.displayMode, expected.displayMode);
-    EXPECT_EQ(actual.viewMode, expected.viewMode);
-    EXPECT_EQ(actual.layers, expected.layers);
-    EXPECT_EQ(actual.file2D, expected.file2D);
-    EXPECT_EQ(actual.comment, expected.comment);
-    EXPECT_EQ(actual.patterns, expected.patterns);
-    EXPECT_EQ(actual.showSections, expected.showSections);
-    EXPECT_EQ(actual.autoClip, expected.autoClip);
-    EXPECT_EQ(actual.overwrite2D, expected.overwrite2D);
-    EXPECT_EQ(actual.removeCoincident, expected.removeCoincident);
-    EXPECT_EQ(actual.lineMerge, expected.lineMerge);
-    EXPECT_EQ(actual.scaleMode, expected.scaleMode);
-    EXPECT_EQ(actual.preserveDimensions, expected.preserveDimensions);
-    EXPECT_EQ(actual.preserveText, expected.preserveText);
-    EXPECT_EQ(actual.preserveWalls, expected.preserveWalls);
-    EXPECT_EQ(actual.preserveLayer, expected.preserveLayer);
-    EXPECT_EQ(actual.preserveLayerIndex, expected.preserveLayerIndex);
+    return out.str();
   }
 
   static CameraSettings SettingsOf(const HRCamera& camera) {
@@ -204,30 +158,50 @@ class ViewsTest : public ::testing::Test {
     return settings;
   }
 
-  // A stored camera of the given kind with distinct values; answers its handle.
-  static host::EntityHandle StoreCamera(const std::string& name, const std::string& className = "HRCamera",
-                                        float seed = 1.0F) {
+  static HRCamera CameraWith(const CameraSettings& settings) {
     HRCamera camera;
-    camera.SetSettings(DistinctSettings(seed));
+    camera.SetSettings(settings);
+    return camera;
+  }
+
+  // A stored camera of the given kind with distinct values; answers its handle.
+  static host::EntityHandle StoreCamera(const std::string& name, const std::string& className = "HRCamera") {
+    HRCamera camera = CameraWith(DistinctSettings());
     camera.SetName(name);
     camera.SetClassName(className);
     EXPECT_EQ(camera.Create(), 0);
     return camera.GetHandle();
   }
 
-  // A stored section five units long along x, made as the pane makes one; answers its handle.
-  static host::EntityHandle StoreSection(const std::string& name = "A", HRSection* keep = nullptr) {
-    HRSection local;
-    HRSection& section = keep != nullptr ? *keep : local;
+  // A stored section made as the pane makes one; answers its instance.
+  static host::EntityHandle StoreSection(HRSection& section, const std::string& name = "A",
+                                         std::array<float, 3> start = {0, 0, 0}, std::array<float, 3> end = {5, 0, 0}) {
     SectionSettings settings;
-    settings.end[0] = 5.0F;
+    std::copy(start.begin(), start.end(), settings.start);
+    std::copy(end.begin(), end.end(), settings.end);
     settings.symbolFile = "...sec_sym\\sec01";
     section.SetName(name);
     section.SetSettings(settings);
     EXPECT_EQ(section.Create(), 0);
     return section.GetHandle();
   }
+  static host::EntityHandle StoreSection(const std::string& name = "A") {
+    HRSection section;
+    return StoreSection(section, name);
+  }
+
+  // A stored plan cut at (1, 2, 0) looking from (1, 2, 5); answers its entity.
+  static host::EntityHandle StorePlan(HRPlane& plan, const std::string& name = "P") {
+    const float base[3] = {1, 2, 0};
+    const float dir[3] = {1, 2, 5};
+    plan.DefineFromPoints(name, base, dir);
+    EXPECT_EQ(plan.Create(), 0);
+    return plan.GetHandle();
+  }
+
+  static host::EntityHandle StoreView(HRSection& section) { return StoreSection(section); }
+  static host::EntityHandle StoreView(HRPlane& plan) { return StorePlan(plan); }
 
  private:
-  std::filesystem::path savedFile_;
+  std::filesystem::path folder_;
 };

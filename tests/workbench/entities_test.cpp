@@ -1,137 +1,114 @@
-// Entity calls: creation, handles, typed records and their type checks, headers, deletion.
+// Entity calls: creation, handles, typed records and their type checks, headers, deletion, and
+// the database walks: which entities each delivers, in what order, and the cursor rules.
 #include <cstring>
+#include <vector>
 
 #include "tests/workbench/host_fixture.h"
 
 using EntityCalls = HostTest;
 
-TEST_F(EntityCalls, AddedLineReadsBackWithLineTypeInItsHeader) {
-  const host::LineRecord line = MakeLine(1, 2, 3, 4, 5, 6);
+TEST_F(EntityCalls, HandlesCountFromOneAndOnlyStateChangesAreJournaled) {
+  const host::LineRecord line = MakeLine({1, 2, 3}, {4, 5, 6});
   EntityHandle entity = 0;
   ASSERT_EQ(qel_add_line(db.handle, &entity, &line), 1);
-  EXPECT_EQ(entity, 1);
-
-  host::EntityHeader header{};
-  ASSERT_EQ(qel_read_entity_header(db.handle, entity, &header), 1);
-  EXPECT_EQ(header.bytes[host::kHeaderType], host::kTypeLine);
   host::LineRecord back{};
   ASSERT_EQ(qel_read_line(db.handle, entity, &back), 1);
   EXPECT_EQ(std::memcmp(&back, &line, sizeof line), 0);
-
-  host::LineRecord moved = MakeLine(9, 9, 9, 8, 8, 8);
-  ASSERT_EQ(qel_update_line(db.handle, entity, &moved), 1);
-  ASSERT_EQ(qel_read_line(db.handle, entity, &back), 1);
-  EXPECT_EQ(back.start.x, 9.0F);
-  EXPECT_EQ(back.end.z, 8.0F);
-}
-
-TEST_F(EntityCalls, HandlesCountFromOneAndAreNeverReused) {
-  EXPECT_EQ(AddLine(), 1);
-  EXPECT_EQ(AddGroup(), 2);
-  EXPECT_EQ(AddLine(), 3);
-  ASSERT_EQ(qel_delete_entity(db.handle, 3), 1);
-  ASSERT_EQ(qel_delete_entity(db.handle, 2), 1);
-  EXPECT_EQ(AddLine(), 4);
-
+  EXPECT_EQ(std::pair(entity, AddGroup()), std::pair(1, 2));
+  ASSERT_EQ(qel_update_line(db.handle, entity, &back), 1);
+  ASSERT_EQ(qel_delete_entity(db.handle, entity), 1);
+  EXPECT_EQ(qel_delete_entity(db.handle, entity), 0) << "a deleted entity cannot be deleted twice";
+  EXPECT_EQ(AddLine(), 3) << "handles are never reused";
   host::EntityHeader header{};
-  EXPECT_EQ(qel_read_entity_header(db.handle, 3, &header), 0);
-  EXPECT_EQ(qel_delete_entity(db.handle, 3), 0) << "a deleted entity cannot be deleted twice";
-  EXPECT_EQ(qel_read_entity_header(db.handle, 0, &header), 0);
-  EXPECT_EQ(qel_read_entity_header(db.handle, -1, &header), 0);
-  EXPECT_EQ(Current().LiveCount(), 2U);
+  for (const EntityHandle absent : {1, 0, -1}) EXPECT_EQ(qel_read_entity_header(db.handle, absent, &header), 0);
+
+  const std::vector<std::string> expected = {"qel_add_line", "qel_create_group", "qel_update_line",
+                                             "qel_delete_entity", "qel_add_line"};
+  EXPECT_EQ(Log().Names(Kind::HostCall), expected);
 }
 
-TEST_F(EntityCalls, TypedReadsAndUpdatesRefuseEntitiesOfAnotherType) {
+TEST_F(EntityCalls, CallsOnTheWrongTypeOrWithUnusableArgumentsChangeNothing) {
   const EntityHandle line = AddLine();
   const EntityHandle group = AddGroup();
   host::LineRecord lineRecord{};
-  host::BlockRecord block{};
   host::GroupRecord groupRecord{};
-  host::PlacedBlockRecord placed{};
-  host::ElementRecord element{};
   char* name = nullptr;
-
-  EXPECT_EQ(qel_read_line(db.handle, group, &lineRecord), 0);
   EXPECT_EQ(qel_update_line(db.handle, group, &lineRecord), 0);
-  EXPECT_EQ(qel_read_block(db.handle, group, &block, &name), 0);
   EXPECT_EQ(qel_read_group(db.handle, line, &groupRecord, &name), 0);
-  EXPECT_EQ(qel_update_group(db.handle, line, &groupRecord), 0);
-  EXPECT_EQ(qel_read_placed_block(db.handle, line, &placed, &name), 0);
-  EXPECT_EQ(qel_read_element(db.handle, group, &element), 0);
-  EXPECT_EQ(qel_update_element(db.handle, line, &element), 0);
   EXPECT_EQ(name, nullptr);
-  EXPECT_EQ(Session().Memory().TotalHandedOut(), 0);
-  EXPECT_EQ(Log().Names(wb::JournalEntry::Kind::HostCall),
-            (std::vector<std::string>{"qel_add_line", "qel_create_group"}))
-      << "refused updates change nothing";
+  EntityHandle entity = 0;
+  EXPECT_EQ(qel_add_line(db.handle + 7, &entity, &lineRecord), 0);
+  EXPECT_EQ(qel_add_text(db.handle, &entity, &lineRecord, "", nullptr, 1), 0);
+  EXPECT_EQ(Current().NextHandle(), 3);
+  EXPECT_EQ(Log().Entries().size(), 2U);
 }
 
 TEST_F(EntityCalls, HeaderUpdateChangesFlagsButNeverTheType) {
   const EntityHandle line = AddLine();
   host::EntityHeader header{};
   ASSERT_EQ(qel_read_entity_header(db.handle, line, &header), 1);
-  header.bytes[host::kHeaderByte9] = 1;
+  EXPECT_EQ(header.bytes[host::kHeaderType], host::kTypeLine);
   header.bytes[host::kHeaderFlags] = 0x85;
   header.bytes[host::kHeaderType] = host::kTypeBlock;
   ASSERT_EQ(qel_update_entity_header(db.handle, line, &header), 1);
-
-  host::EntityHeader back{};
-  ASSERT_EQ(qel_read_entity_header(db.handle, line, &back), 1);
-  EXPECT_EQ(back.bytes[host::kHeaderByte9], 1);
-  EXPECT_EQ(back.bytes[host::kHeaderFlags], 0x85);
-  EXPECT_EQ(back.bytes[host::kHeaderType], host::kTypeLine);
-  host::LineRecord record{};
-  EXPECT_EQ(qel_read_line(db.handle, line, &record), 1) << "still readable as the line it is";
-}
-
-TEST_F(EntityCalls, TextIsALineEntityCarryingItsText) {
-  const host::LineRecord position = MakeLine(1, 1, 0, 1, 1, 0);
-  EntityHandle text = 0;
-  ASSERT_EQ(qel_add_text(db.handle, &text, &position, "", "Section A", 1), 1);
-
-  host::EntityHeader header{};
-  ASSERT_EQ(qel_read_entity_header(db.handle, text, &header), 1);
+  ASSERT_EQ(qel_read_entity_header(db.handle, line, &header), 1);
+  EXPECT_EQ(header.bytes[host::kHeaderFlags], 0x85);
   EXPECT_EQ(header.bytes[host::kHeaderType], host::kTypeLine);
-  EXPECT_EQ(ReadString(text, "t="), "Section A");
-  EXPECT_EQ(is_attribute_exist(db.handle, text, "t="), 1);
-  EXPECT_EQ(is_attribute_exist(db.handle, text, "tb="), 0) << "the text block is the caller's to write";
-  EXPECT_EQ(qel_add_text(db.handle, &text, &position, "", nullptr, 1), 0);
 }
 
-TEST_F(EntityCalls, UnusableArgumentsAreRefusedWithoutCreatingAnything) {
-  const host::LineRecord line = MakeLine(0, 0, 0, 1, 1, 1);
+class DatabaseWalks : public HostTest {
+ protected:
+  // Handles 1 to 5: 2 is hidden, 4 deleted.
+  void SetUp() override {
+    HostTest::SetUp();
+    for (int i = 0; i < 5; ++i) AddLine(static_cast<float>(i));
+    Current().Find(2)->header.bytes[host::kHeaderFlags] |= host::kFlagHidden;
+    ASSERT_EQ(qel_delete_entity(db.handle, 4), 1);
+  }
+
+  using Walk = Status (*)(DatabaseHandle, EntityHandle*, std::int32_t*);
+  static std::vector<EntityHandle> WalkAll(Walk walk, bool addOnTheWay = false) {
+    std::vector<EntityHandle> seen;
+    EntityHandle entity = 0;
+    std::int32_t cursor = 0;
+    while (walk(db.handle, &entity, &cursor) == 1) {
+      seen.push_back(entity);
+      if (addOnTheWay && entity == 1) AddLine();
+    }
+    return seen;
+  }
+};
+
+TEST_F(DatabaseWalks, VisibleWalkSkipsHiddenEntitiesAndBlankWalksIncludeThem) {
+  EXPECT_EQ(WalkAll(loop_on_database_blank), (std::vector<EntityHandle>{1, 2, 3, 5}));
+  EXPECT_EQ(WalkAll(loop_on_database, true), (std::vector<EntityHandle>{1, 3, 5, 6})) << "additions come at the end";
+  host::EntityHeader header{};
   EntityHandle entity = 0;
-  EXPECT_EQ(qel_add_line(db.handle + 7, &entity, &line), 0);
-  EXPECT_EQ(qel_add_line(db.handle, nullptr, &line), 0);
-  EXPECT_EQ(qel_add_line(db.handle, &entity, nullptr), 0);
-  EXPECT_EQ(qel_read_entity_header(db.handle, AddLine(), nullptr), 0);
-  EXPECT_EQ(Current().NextHandle(), 2);
+  std::int32_t cursor = 1;
+  ASSERT_EQ(loop_on_database_blank_h(db.handle, &entity, &cursor, &header), 1);
+  EXPECT_EQ(entity, 2);
+  EXPECT_EQ(header.bytes[host::kHeaderFlags], host::kFlagHidden) << "the header comes with the entity";
+  EXPECT_EQ(loop_on_database_blank_h(db.handle, &entity, &cursor, nullptr), 0);
 }
 
-TEST_F(EntityCalls, DeletedEntityLeavesEveryBlockThatListedIt) {
-  const EntityHandle a = AddLine();
-  const EntityHandle b = AddLine();
-  const EntityHandle members[] = {a, b, a};
-  const host::BlockRecord record{};
-  EntityHandle block = 0;
-  ASSERT_EQ(qel_create_block(db.handle, &block, 3, members, "blk", &record), 1);
-
-  ASSERT_EQ(qel_delete_entity(db.handle, a), 1);
-  EXPECT_EQ(Current().Find(block)->members, (std::vector<EntityHandle>{b}));
-}
-
-TEST_F(EntityCalls, StateChangingCallsAreJournaledByName) {
-  const EntityHandle line = AddLine();
-  host::LineRecord record = MakeLine(0, 0, 0, 2, 2, 2);
-  ASSERT_EQ(qel_update_line(db.handle, line, &record), 1);
-  host::LineRecord read{};
-  ASSERT_EQ(qel_read_line(db.handle, line, &read), 1);
-  ASSERT_EQ(qel_delete_entity(db.handle, line), 1);
-
-  const std::vector<wb::JournalEntry> expected = {
-      {wb::JournalEntry::Kind::HostCall, "qel_add_line", line, 0},
-      {wb::JournalEntry::Kind::HostCall, "qel_update_line", line, 0},
-      {wb::JournalEntry::Kind::HostCall, "qel_delete_entity", line, 0},
-  };
-  EXPECT_EQ(Log().Entries(), expected) << "reads are not journaled";
+TEST_F(DatabaseWalks, CursorIsTheNextSlotAndTheEndKeepsAnswering0) {
+  EntityHandle entity = 0;
+  std::int32_t cursor = 0;
+  ASSERT_EQ(loop_on_database(db.handle, &entity, &cursor), 1);
+  ASSERT_EQ(loop_on_database(db.handle, &entity, &cursor), 1);
+  EXPECT_EQ(std::pair(entity, cursor), std::pair(3, 3));
+  // Kinds share the cursor: a blank walk goes on where the visible one stopped.
+  ASSERT_EQ(loop_on_database_blank(db.handle, &entity, &cursor), 1);
+  EXPECT_EQ(entity, 5);
+  for (int i = 0; i < 2; ++i) EXPECT_EQ(loop_on_database_blank(db.handle, &entity, &cursor), 0);
+  EXPECT_EQ(entity, 0);
+  for (const std::int32_t unusable : {-1, 1000}) {
+    cursor = unusable;
+    EXPECT_EQ(loop_on_database_blank(db.handle, &entity, &cursor), 0) << unusable;
+  }
+  cursor = 0;
+  EXPECT_EQ(loop_on_database_blank(db.handle + 1, &entity, &cursor), 0);
+  EXPECT_EQ(loop_on_database_blank(db.handle, nullptr, &cursor), 0);
+  Session().SetCurrent(Session().Open(wb::Drawing{}));
+  EXPECT_TRUE(WalkAll(loop_on_database_blank).empty()) << "an empty drawing ends at once";
 }

@@ -1,13 +1,13 @@
-// The view calls: view window, fitting the window to the drawing, redraw calls, 2D and 3D,
-// the wait cursor's balance and scale keeping, each honouring faults.
+// The view and layer calls: view window, fitting the window to the drawing, the wait cursor's
+// balance, scale keeping, and the layer table of the current drawing.
 #include <array>
 #include <limits>
 
-#include "tests/workbench_view/view_host_fixture.h"
+#include "tests/workbench/host_fixture.h"
 
 namespace {
 
-class ViewCallsTest : public ViewHostTest {
+class ViewCallsTest : public HostTest {
  protected:
   using Rect = std::array<double, 4>;
 
@@ -16,131 +16,82 @@ class ViewCallsTest : public ViewHostTest {
     wn3_inq_view_rect(rect.data());
     return rect;
   }
-
-  static wb::Entity& AddLine(host::Point3f start, host::Point3f end, std::uint8_t layer = 0) {
-    wb::Entity& entity = Session().CurrentDrawing().Add(host::kTypeLine);
+  static wb::Entity& AddLineOn(host::Point3f start, host::Point3f end, std::uint8_t layer = 0) {
+    wb::Entity& entity = Current().Add(host::kTypeLine);
     entity.header.bytes[host::kHeaderLayer] = layer;
-    host::LineRecord line{};
-    line.start = start;
-    line.end = end;
-    wb::WriteRecord(entity, line);
+    wb::WriteRecord(entity, MakeLine(start, end));
     return entity;
   }
 };
 
-TEST_F(ViewCallsTest, ViewWindowReadsBackAsSetWithItsCornersInOrder) {
-  const Rect set{-3.5, 2.0, 40.25, 18.0};
-  wn3_set_view_rect(set.data());
-  EXPECT_EQ(Window(), set);
-
-  const Rect swapped{10.0, 8.0, -2.0, 1.0};
-  wn3_set_view_rect(swapped.data());
-  EXPECT_EQ(Window(), (Rect{-2.0, 1.0, 10.0, 8.0}));
-}
-
-TEST_F(ViewCallsTest, ViewWindowThatCannotBeDrawnIsRefused) {
-  const Rect before = Window();
-  const Rect broken{0.0, std::numeric_limits<double>::quiet_NaN(), 1.0, 1.0};
-  wn3_set_view_rect(broken.data());
-  wn3_set_view_rect(nullptr);
-  EXPECT_EQ(Window(), before);
-  EXPECT_TRUE(HostCalls().empty());
-}
-
-TEST_F(ViewCallsTest, FittingTheWindowTakesTheShownLinesOnly) {
-  AddLine({-4, 1, 0}, {6, 3, 2});
-  AddLine({100, 100, 0}, {200, 200, 0}, 7);  // on a layer that is off
-  wb::Entity& hidden = AddLine({-50, -50, 0}, {-40, -40, 0});
-  hidden.header.bytes[host::kHeaderFlags] |= host::kFlagHidden;
-  Session().CurrentDrawing().layers[7].on = false;
-
+TEST_F(ViewCallsTest, WindowIsSetInCornerOrderAndFittedToTheShownLinesOnly) {
+  wn3_set_view_rect(Rect{10.0, 8.0, -2.0, 1.0}.data());
+  wn3_set_view_rect(Rect{0.0, std::numeric_limits<double>::quiet_NaN(), 1.0, 1.0}.data());
   wn3_auto_window(4);
-  EXPECT_EQ(Window(), (Rect{-4.0, 1.0, 6.0, 3.0}));
-  EXPECT_EQ(View().autoWindowFits, 1);
-}
+  EXPECT_EQ(Window(), (Rect{-2.0, 1.0, 10.0, 8.0})) << "an empty drawing keeps the window";
 
-TEST_F(ViewCallsTest, FittingAPointGivesAWindowWithArea) {
-  AddLine({2, 5, 0}, {2, 5, 9});
+  AddLineOn({2, 5, 0}, {2, 5, 9});
   wn3_auto_window(4);
-  EXPECT_EQ(Window(), (Rect{1.5, 4.5, 2.5, 5.5}));
-}
-
-TEST_F(ViewCallsTest, FittingAnEmptyDrawingOrAnUnknownModeKeepsTheWindow) {
-  const Rect before = Window();
-  wn3_auto_window(4);
-  EXPECT_EQ(Window(), before);
-  AddLine({0, 0, 0}, {1, 1, 0});
+  EXPECT_EQ(Window(), (Rect{1.5, 4.5, 2.5, 5.5})) << "a point gets a window with area";
+  AddLineOn({-4, 1, 0}, {6, 3, 2});
+  AddLineOn({100, 100, 0}, {200, 200, 0}, 7);
+  Current().layers[7].on = false;
+  AddLineOn({-50, -50, 0}, {-40, -40, 0}).header.bytes[host::kHeaderFlags] |= host::kFlagHidden;
   wn3_auto_window(3);
-  EXPECT_EQ(Window(), before);
-  EXPECT_EQ(View().autoWindowFits, 1);
-}
-
-TEST_F(ViewCallsTest, DisplayListRedrawIsHeldWhileRedrawingIsOff) {
-  wn3_dl_redraw(2);
-  init_hdl_redraw_draw_params();
-  EXPECT_EQ(View().redraws.displayList, 1);
-  EXPECT_EQ(View().redraws.lastDisplayListMode, 2);
-  EXPECT_EQ(View().redraws.drawParameterResets, 1);
-
-  execute_internal_command("start_redraw_off");
-  wn3_dl_redraw(5);
-  EXPECT_EQ(View().redraws.displayList, 1);
-  EXPECT_EQ(View().redraws.lastDisplayListMode, 5);
-  execute_internal_command("start_redraw_on");
-  EXPECT_EQ(View().redraws.full, 1);
+  EXPECT_EQ(Window(), (Rect{1.5, 4.5, 2.5, 5.5})) << "only mode 4 fits";
+  wn3_auto_window(4);
+  EXPECT_EQ(Window(), (Rect{-4.0, 1.0, 6.0, 5.0}));
 }
 
 TEST_F(ViewCallsTest, WaitCursorBalancesAndNeverGoesNegative) {
   add_wait_cur();
-  add_wait_cur();
-  remove_wait_cur();
-  EXPECT_EQ(View().waitCursor, 1);
   remove_wait_cur();
   remove_wait_cur();
   EXPECT_EQ(View().waitCursor, 0);
   EXPECT_EQ(View().waitCursorUnderflows, 1);
-  EXPECT_EQ(HostCalls(),
-            (std::vector<std::string>{"add_wait_cur", "add_wait_cur", "remove_wait_cur", "remove_wait_cur"}));
-}
-
-TEST_F(ViewCallsTest, ScalingSwitchesFollowTheScaleMode) {
-  const std::pair<char, std::pair<int, int>> cases[] = {{'a', {0, 1}}, {'f', {1, 0}}, {'o', {0, 0}}, {' ', {0, 0}}};
-  for (const auto& [mode, switches] : cases) {
-    globc[22] = mode;
-    execute_internal_command("set_scale_mode");
-    EXPECT_EQ(wnp_fixed_scaling(), switches.first) << mode;
-    EXPECT_EQ(wnp_auto_scaling(), switches.second) << mode;
-  }
+  EXPECT_EQ(Log().Names(Kind::HostCall), (std::vector<std::string>{"add_wait_cur", "remove_wait_cur"}));
 }
 
 TEST_F(ViewCallsTest, FixedScalingKeepsTheScaleOfThePresentWindow) {
+  const std::pair<char, std::pair<int, int>> switches[] = {{'a', {0, 1}}, {'o', {0, 0}}, {'f', {1, 0}}};
+  for (const auto& [mode, fixedAndAuto] : switches) {
+    globc[22] = mode;
+    Run("set_scale_mode");
+    EXPECT_EQ(std::pair(wnp_fixed_scaling(), wnp_auto_scaling()), fixedAndAuto) << mode;
+  }
+  for (float unusable : {0.0F, -2.0F, std::numeric_limits<float>::infinity()}) dBox_window_set_keep_scale(unusable);
+  EXPECT_EQ(dBox_window_keep_scale(), 0);
   View().boxWidth = 0.5;
-  const Rect window{0.0, 0.0, 20.0, 10.0};
-  wn3_set_view_rect(window.data());
-  globc[22] = 'f';
-  execute_internal_command("set_scale_mode");
-
-  ASSERT_NE(wnp_fixed_scaling(), 0);
-  const double scale = dBox_calc_scale();
-  EXPECT_EQ(scale, 40.0);
-  dBox_window_set_keep_scale(static_cast<float>(scale));
+  wn3_set_view_rect(Rect{0.0, 0.0, 20.0, 10.0}.data());
+  EXPECT_EQ(dBox_calc_scale(), 40.0);
+  dBox_window_set_keep_scale(40.0F);
   EXPECT_EQ(dBox_window_keep_scale(), 1);
   EXPECT_EQ(View().keptScale, 40.0F);
-  EXPECT_TRUE(View().keepingScale);
-
   globc[22] = 'a';
-  execute_internal_command("set_scale_mode");
-  EXPECT_FALSE(View().keepingScale);
-  EXPECT_EQ(View().keptScale, 40.0F);
+  Run("set_scale_mode");
+  EXPECT_FALSE(View().keepingScale) << "auto scaling lets the scale go";
 }
 
-TEST_F(ViewCallsTest, ScaleThatCannotBeDrawnAtIsNotKept) {
-  dBox_window_set_keep_scale(0.0F);
-  dBox_window_set_keep_scale(-2.0F);
-  dBox_window_set_keep_scale(std::numeric_limits<float>::infinity());
-  EXPECT_EQ(View().keptScale, 0.0F);
-  EXPECT_EQ(dBox_window_keep_scale(), 0);
-  EXPECT_FALSE(View().keepingScale);
+TEST_F(ViewCallsTest, LayerTableBelongsToItsDrawingAndRefusesWhatItDoesNotHold) {
+  const host::LayerTableHandle table = HDL_Main();
+  const std::pair<host::LayerTableHandle, int> refused[] = {{table, -1}, {table, 256}, {db.handle, 4}, {0, 4}};
+  for (const auto& [handle, index] : refused) EXPECT_EQ(HDL_Set_Layer_Off(handle, index), 0) << handle << " " << index;
+  EXPECT_EQ(HDL_Get_LayerName(db.handle, 0), nullptr) << "a database handle is no table handle";
+  EXPECT_EQ(HDL_Set_Layer_Off(table, 255), 1);
+  EXPECT_EQ(GetLayersInCurrentHDL()[255].state, host::kLayerOffState);
+  EXPECT_EQ(Log().Entries(), (std::vector<wb::JournalEntry>{{Kind::HostCall, "HDL_Set_Layer_Off", 0, 255}}));
+
+  wb::Drawing other;
+  other.layers[9] = {"Roof", false};
+  Session().SetCurrent(Session().Open(std::move(other)));
+  EXPECT_EQ(GetLayersInCurrentHDL()[9].state, host::kLayerOffState);
+  EXPECT_STREQ(HDL_Get_LayerName(HDL_Main(), 9), "Roof");
+  EXPECT_EQ(HDL_Set_Layer_Off(table, 5), 1);
+  EXPECT_EQ(GetLayersInCurrentHDL()[5].state, 0) << "the first drawing's table reaches the first drawing only";
+  EXPECT_FALSE(Session().Find(1)->layers[5].on);
+  Session().Close(db.handle);
+  EXPECT_EQ(GetLayersInCurrentHDL(), nullptr);
+  EXPECT_EQ(HDL_Main(), 0);
 }
 
 }  // namespace
