@@ -29,7 +29,6 @@ TEST_F(LineTest, CreateUpdateAndReadCarryTheRecordInTheHostsNarrowForm) {
 
   HRLine read;
   EXPECT_EQ(read.Read(entity), 0);
-  EXPECT_EQ(read.GetStart().x, static_cast<double>(0.1F));
   EXPECT_EQ((std::vector<int>{read.GetLineType(), read.GetColor(), read.GetWidth()}), (std::vector<int>{255, 44, 2}));
 }
 

@@ -55,8 +55,6 @@ TEST_F(PrimitiveTest, KindFollowsTheEntityTypeAndALineWithATextBlockIsEleven) {
     ASSERT_EQ(wrapper.Read(AddEntity(type)), 0);
     EXPECT_EQ(wrapper.GetKind(), kinds[type]) << "type " << int{type};
   }
-  ASSERT_EQ(wrapper.Read(AddEntity(255)), 0);
-  EXPECT_EQ(wrapper.GetKind(), 12);
   const host::EntityHandle text = AddEntity(host::kTypeLine);
   AddStringAttribute(text, "tb=", "");
   ASSERT_EQ(wrapper.Read(text), 0);
@@ -68,9 +66,12 @@ TEST_F(PrimitiveTest, StringAttributeNamesReachTheHostWithExactlyOneEqualsSign) 
   wrapper.SetEntity(AddEntity(host::kTypeGroup));
   const char* const names[] = {"@Class", "@Class=", "@Class=="};
   for (const char* name : names) EXPECT_EQ(wrapper.SetStringAttribute(name, name), 0);
+  const float floats[1] = {1.5F};
   EXPECT_EQ(wrapper.SetShortAttribute("@S2D", 7), 0);  // only strings and short reads are made canonical
-  EXPECT_EQ(AttributeWrites(), (std::vector<std::string>{"@Class=", "@Class=", "@Class=", "@S2D"}));
-  EXPECT_EQ(Find(wrapper.GetEntity())->attributes.size(), 2U);
+  EXPECT_EQ(wrapper.SetFloatVectorAttribute("@dir", floats, 1), 0);
+  EXPECT_EQ(AttributeWrites(), (std::vector<std::string>{"@Class=", "@Class=", "@Class=", "@S2D", "@dir"}));
+  EXPECT_EQ(AttributeOf(wrapper.GetEntity(), "@dir")->format, 6);
+  EXPECT_EQ(Find(wrapper.GetEntity())->attributes.size(), 3U);
   std::string text;
   for (const char* name : names) {
     EXPECT_EQ(wrapper.GetStringAttribute(name, text), 0);
@@ -87,8 +88,8 @@ TEST_F(ClassMarkerTest, MatchesOnlyTheExactClassNameAndReleasesEveryText) {
   const host::EntityHandle entity = AddEntity(host::kTypePlacedBlock);
   AddStringAttribute(entity, "@Class=", "HRSection");
   EXPECT_TRUE(HasClassMarker(Database(), entity, "HRSection"));
-  for (const char* other : {"hrsection", "HRSection ", "HRSectio", ""})
-    EXPECT_FALSE(HasClassMarker(Database(), entity, other));
+  for (const char* name : {"hrsection", "HRSection ", "HRSectio", ""})
+    EXPECT_FALSE(HasClassMarker(Database(), entity, name));
   EXPECT_EQ(Bench().Memory().TotalHandedOut(), 5);
 }
 

@@ -90,7 +90,6 @@ class StatusCodeTest : public ModelTest, public ::testing::WithParamInterface<St
 std::vector<StatusCase> StatusCodeTest::Cases() {
   return {
       // The base wrapper and the attribute family; the base header update fails only on 0.
-      {"", 0, -2, [](Stored&) { return HRUnknown().Read(42); }},
       {"qel_read_entity_header", 0, -2, [](Stored& s) { return HRUnknown().Read(s.line.GetEntity()); }},
       {"qel_update_entity_header", 0, -3, [](Stored& s) { return s.base.Update(); }},
       {"qel_update_entity_header", 5, 0, [](Stored& s) { return s.base.Update(); }},

@@ -54,7 +54,6 @@ TEST_F(WrapEntityTest, EveryCreatedEntityIsMarkedWrapsBackIntoItsClassAndDeletes
     std::unique_ptr<HRPrimitive> wrapped;
     EXPECT_EQ(WrapEntity(Database(), entity, wrapped), 0);
     EXPECT_EQ(ClassOf(wrapped), ClassOf(c.wrapper));
-    EXPECT_EQ(wrapped->GetEntity(), entity);
     EXPECT_EQ(wrapped->GetEntityType(), c.type);
 
     ClearJournal();
