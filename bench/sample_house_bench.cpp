@@ -4,12 +4,12 @@
 #include <filesystem>
 #include <unistd.h>
 
+#include "app/plugin_session.h"
 #include "display/build_batch.h"
 #include "display/save2d.h"
 #include "samples/sample_drawing.h"
 #include "shell/host/argument_blocks.h"
 #include "shell/host/qeldll_2d.h"
-#include "shell/plugin_exports.h"
 #include "views/hr_camera_mgr.h"
 #include "views/view_collection.h"
 #include "workbench/workbench.h"
@@ -19,20 +19,14 @@ namespace {
 // The sample house open in the workbench with the plug-in loaded; output under a temp folder.
 class HouseSession {
  public:
-  HouseSession() : folder_(std::filesystem::temp_directory_path() / ("pandex-bench-" + std::to_string(::getpid()))) {
-    const wb::Drawing house = samples::MakeSampleDrawing();
-    wb::Workbench& bench = wb::Workbench::Get();
-    bench.Reset();
-    const host::DatabaseHandle blank = bench.Current();
-    bench.SetCurrent(bench.Open(house));
-    bench.Close(blank);
-    bench.LoadPlugin({pandex::kExports.attach, pandex::kExports.detach, pandex::kExports.entry});
+  HouseSession()
+      : folder_(std::filesystem::temp_directory_path() / ("pandex-bench-" + std::to_string(::getpid()))),
+        session_(samples::MakeSampleDrawing()) {
     std::filesystem::create_directories(folder_);
-    bench.SetDrawingPath(db.handle, (folder_ / "house.pdx").string());
+    wb::Workbench::Get().SetDrawingPath(db.handle, (folder_ / "house.pdx").string());
     SetDatabase(db.handle);
   }
   ~HouseSession() {
-    wb::Workbench::Get().Reset();
     std::error_code error;
     std::filesystem::remove_all(folder_, error);
   }
@@ -40,6 +34,7 @@ class HouseSession {
 
  private:
   std::filesystem::path folder_;
+  app::PluginSession session_;
 };
 
 void SampleHouseOneView(benchmark::State& state) {

@@ -6,6 +6,7 @@
 #include "display/display_mode.h"
 #include "model/class_marker.h"
 #include "model/current_database.h"
+#include "model/host_point.h"
 #include "model/status_codes.h"
 #include "shell/host/argument_blocks.h"
 #include "shell/host/qeldll.h"
@@ -19,10 +20,6 @@ constexpr const char* kPlaneClass = "HRPlane";
 constexpr float kAxisLength = 100.0F;  // drawing units
 
 void Run(const char* command) { execute_internal_command(command); }
-
-host::Point3f Narrow(const double point[3]) {
-  return {static_cast<float>(point[0]), static_cast<float>(point[1]), static_cast<float>(point[2])};
-}
 
 // Reads a 3-float vector attribute into doubles; false when it is absent or not 3 long.
 bool ReadPoint(const HRGroup& group, const char* name, double out[3]) {
@@ -66,8 +63,8 @@ std::int16_t HRPlane::Load(host::EntityHandle entity) { return LoadFrom(GetCurre
 std::int16_t HRPlane::Save() { return SaveTo(GetCurrentDatabase()); }
 
 void HRPlane::WriteRecord(bool removeEmptyCameraList) {
-  const host::Point3f base = Narrow(base_);
-  const host::Point3f dir = Narrow(dir_);
+  const host::Point3f base = ToHostPoint(base_);
+  const host::Point3f dir = ToHostPoint(dir_);
   group_.SetFloatVectorAttribute("@base=", &base.x, 3);
   group_.SetFloatVectorAttribute("@dir=", &dir.x, 3);
   group_.SetStringAttribute("@name=", name_);
@@ -116,11 +113,11 @@ std::int16_t HRPlane::ShowView(std::int32_t cameraIndex, const void* /*context*/
     if (const std::int16_t loaded = cameras_.Load(cameraIndex, camera); loaded != 0) return loaded;
     camera.ApplyView(0);
   }
-  const host::Point3f base = Narrow(base_);
+  const host::Point3f base = ToHostPoint(base_);
   globp[0] = base;
   globp[1] = {base.x + kAxisLength, base.y, base.z};
   globp[2] = {base.x, base.y + kAxisLength, base.z};
-  globp[3] = Narrow(dir_);
+  globp[3] = ToHostPoint(dir_);
 
   if (cut_display::RenderingActive()) {
     // The camera's first phase turned the wait cursor on; do not leave it on when refusing.

@@ -3,6 +3,7 @@
 #include "views/hr_section.h"
 
 #include "model/current_database.h"
+#include "model/host_point.h"
 #include "model/status_codes.h"
 #include "shell/host/qeldll.h"
 
@@ -17,10 +18,6 @@ void SidePoint(const double start[3], const double end[3], double side[3]) {
   side[0] = start[0] - (end[1] - start[1]);
   side[1] = start[1] + (end[0] - start[0]);
   side[2] = start[2];
-}
-
-host::Point3f Narrow(const double point[3]) {
-  return {static_cast<float>(point[0]), static_cast<float>(point[1]), static_cast<float>(point[2])};
 }
 
 // Writes a string attribute under the name exactly as given (the end marks' role key has no
@@ -57,8 +54,8 @@ void HRSection::BuildFromPoints(const std::string& name, const std::string& symb
 }
 
 void HRSection::LayOut(const double start[3], const double end[3]) {
-  const host::Point3f from = Narrow(start);
-  const host::Point3f to = Narrow(end);
+  const host::Point3f from = ToHostPoint(start);
+  const host::Point3f to = ToHostPoint(end);
   const double length = distance_3d(&from, &to);
   double side[3];
   SidePoint(start, end, side);

@@ -1,5 +1,6 @@
 // A section's cut view and its own cameras ("hrSecCam" entities listed under "@CamLst=").
 #include "display/display_mode.h"
+#include "model/host_point.h"
 #include "shell/host/argument_blocks.h"
 #include "shell/host/qeldll.h"
 #include "shell/host/qeldll_view.h"
@@ -10,12 +11,6 @@
 namespace {
 
 void Run(const char* command) { execute_internal_command(command); }
-
-host::Point3f ToPoint(const HRMath::Vector& vector) {
-  float values[3];
-  vector.CopyTo(values);
-  return {values[0], values[1], values[2]};
-}
 
 }  // namespace
 
@@ -35,8 +30,8 @@ std::int16_t HRSection::ShowView(std::int32_t cameraIndex) {
   HRMath::Vector start;
   HRMath::Vector end;
   CutLine(start, end);
-  const host::Point3f s = ToPoint(start);
-  const host::Point3f e = ToPoint(end);
+  const host::Point3f s = ToHostPoint(start);
+  const host::Point3f e = ToHostPoint(end);
   globp[0] = s;
   globp[1] = e;
   globp[2] = {s.x, s.y, s.z + 1.0F};

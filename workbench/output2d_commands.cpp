@@ -106,15 +106,11 @@ host::Status MergeSources() {
   std::vector<draft::Sheet> sources = std::move(state.sources);
   state.sources.clear();
   if (sources.empty() || state.sourceTarget.empty()) return 0;
-  draft::Sheet merged;
-  for (draft::Sheet& source : sources) {
-    merged.layerNames = source.layerNames;
-    merged.strokes.insert(merged.strokes.end(), source.strokes.begin(), source.strokes.end());
-    merged.labels.insert(merged.labels.end(), source.labels.begin(), source.labels.end());
-  }
   const bool replace = OverwriteTarget();
   state.lastMergeReplaced = replace;
   try {
+    draft::Sheet merged = std::move(sources.front());
+    for (std::size_t i = 1; i < sources.size(); ++i) merged = draft::MergeSheets(merged, sources[i]);
     draft::WriteSheetFiles(merged, state.sourceTarget, replace);
   } catch (const std::exception&) {
     return 0;  // the old files stay as they were
