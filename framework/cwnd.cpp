@@ -246,15 +246,11 @@ LRESULT CWnd::WindowProcedure(HWND hwnd, UINT message, WPARAM wParam, LPARAM lPa
   if (!m_hWnd) {
     // A window created for this object: its first message introduces it.
     m_hWnd = hwnd;
+    owned_ = true;
     PreSubclassWindow();
   }
-  if (message == WM_NCDESTROY) {
-    // Nothing of this object may be touched once PostNcDestroy ran: it may have deleted itself.
-    MessageStack().push_back({message, wParam, lParam});
-    OnNcDestroy();
-    MessageStack().pop_back();
-    return 0;
-  }
+  // Nothing of this object is touched after WindowProc: on WM_NCDESTROY the object may have
+  // deleted itself in PostNcDestroy.
   MessageStack().push_back({message, wParam, lParam});
   const LRESULT result = WindowProc(message, wParam, lParam);
   MessageStack().pop_back();
@@ -305,6 +301,9 @@ BOOL CWnd::DispatchStandardMessage(UINT message, WPARAM wParam, LPARAM lParam, L
       return TRUE;
     case WM_DESTROY:
       OnDestroy();
+      break;
+    case WM_NCDESTROY:
+      OnNcDestroy();
       break;
     case WM_SHOWWINDOW:
       OnShowWindow(static_cast<BOOL>(wParam), static_cast<UINT>(lParam));

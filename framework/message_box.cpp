@@ -99,7 +99,7 @@ DialogTemplate LayOut(std::string_view text, std::string_view caption, UINT type
                        UnitsY(kMargin), UnitsX(iconSize), UnitsY(iconSize)});
   }
   const int textTop = kMargin + std::max(0, (iconSize - textHeight) / 2);
-  t.items.push_back({kTextControlId, framework::kStaticClass, text, WS_VISIBLE | SS_LEFT, 0, UnitsX(textLeft),
+  t.items.push_back({kTextControlId, framework::kStaticClass, text, WS_VISIBLE | SS_LEFT | SS_NOPREFIX, 0, UnitsX(textLeft),
                      UnitsY(textTop), UnitsX(textWidth + 2), UnitsY(textHeight)});
   int left = clientWidth - kMargin - rowWidth;
   bool first = true;

@@ -63,6 +63,7 @@ constexpr DWORD SS_CENTER = 0x0001;
 constexpr DWORD SS_RIGHT = 0x0002;
 constexpr DWORD SS_ICON = 0x0003;
 constexpr DWORD SS_TYPEMASK = 0x001F;
+constexpr DWORD SS_NOPREFIX = 0x0080;  // an ampersand is shown, not taken as a key mark
 constexpr DWORD SS_NOTIFY = 0x0100;
 constexpr DWORD SS_SUNKEN = 0x1000;
 

@@ -49,7 +49,7 @@ class StaticBehaviour : public ControlBehaviour {
     dc.SetBkMode(TRANSPARENT);
     dc.SetTextColor(TextColor(hwnd));
     CRect text = r;
-    UINT format = DT_WORDBREAK;
+    UINT format = DT_WORDBREAK | ((style & SS_NOPREFIX) != 0 ? DT_NOPREFIX : 0);
     if ((style & SS_TYPEMASK) == SS_CENTER) format |= DT_CENTER;
     if ((style & SS_TYPEMASK) == SS_RIGHT) format |= DT_RIGHT;
     dc.DrawText(::GetWindowText(hwnd), &text, format);
