@@ -212,16 +212,8 @@ class ButtonBehaviour : public ControlBehaviour {
   }
 
   void PaintOwnerDrawn(HWND hwnd, Canvas& canvas) const {
-    DRAWITEMSTRUCT item;
-    item.CtlType = ODT_BUTTON;
-    item.CtlID = static_cast<UINT>(::GetDlgCtrlID(hwnd));
-    item.itemAction = ODA_DRAWENTIRE;
-    item.itemState = (pushed_ ? ODS_SELECTED : 0) | (HasFocus(hwnd) ? ODS_FOCUS : 0) |
-                     (::IsWindowEnabled(hwnd) ? 0 : ODS_DISABLED) | (check_ == BST_CHECKED ? ODS_CHECKED : 0);
-    item.hwndItem = hwnd;
-    item.hDC = &canvas;
-    item.rcItem = ClientRect(hwnd);
-    ::SendMessage(::GetParent(hwnd), WM_DRAWITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
+    const UINT state = (pushed_ ? ODS_SELECTED : 0) | (HasFocus(hwnd) ? ODS_FOCUS : 0) | (check_ == BST_CHECKED ? ODS_CHECKED : 0);
+    AskOwnerToDraw(hwnd, canvas, ODT_BUTTON, 0, state, ClientRect(hwnd));
   }
 
   int check_ = BST_UNCHECKED;

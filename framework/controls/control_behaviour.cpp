@@ -32,6 +32,21 @@ void ControlBehaviour::Command(HWND control, UINT code) {
                 control.ToLParam());
 }
 
+void ControlBehaviour::AskOwnerToDraw(HWND control, Canvas& canvas, UINT type, UINT item, UINT state, const RECT& rect,
+                                      UINT_PTR data) {
+  DRAWITEMSTRUCT draw;
+  draw.CtlType = type;
+  draw.CtlID = static_cast<UINT>(::GetDlgCtrlID(control));
+  draw.itemID = item;
+  draw.itemAction = ODA_DRAWENTIRE;
+  draw.itemState = state | (::IsWindowEnabled(control) ? 0 : ODS_DISABLED);
+  draw.hwndItem = control;
+  draw.hDC = &canvas;
+  draw.rcItem = rect;
+  draw.itemData = data;
+  ::SendMessage(::GetParent(control), WM_DRAWITEM, draw.CtlID, reinterpret_cast<LPARAM>(&draw));
+}
+
 CRect ControlBehaviour::ClientRect(HWND hwnd) {
   RECT r;
   ::GetClientRect(hwnd, &r);

@@ -27,6 +27,10 @@ class ControlBehaviour : public WindowBehaviour {
   static LRESULT Notify(HWND control, UINT code, NMHDR* header = nullptr);
   // Sends WM_COMMAND with a notification code to the parent.
   static void Command(HWND control, UINT code);
+  // Has the parent draw one item of an owner-drawn control (WM_DRAWITEM); the parent hands the
+  // request to the control's own object when it has one.
+  static void AskOwnerToDraw(HWND control, Canvas& canvas, UINT type, UINT item, UINT state, const RECT& rect,
+                             UINT_PTR data = 0);
   static CRect ClientRect(HWND hwnd);
   // The text colour of the control: grey when it is disabled.
   static COLORREF TextColor(HWND hwnd);

@@ -256,18 +256,9 @@ class TabBehaviour : public ControlBehaviour {
   }
 
   void DrawOwnerTab(HWND hwnd, Canvas& canvas, int index, const CRect& inside) const {
-    DRAWITEMSTRUCT item;
-    item.CtlType = ODT_TAB;
-    item.CtlID = static_cast<UINT>(::GetDlgCtrlID(hwnd));
-    item.itemID = static_cast<UINT>(index);
-    item.itemAction = ODA_DRAWENTIRE;
-    item.itemState = (index == selected_ ? ODS_SELECTED : 0) | (::IsWindowEnabled(hwnd) ? 0 : ODS_DISABLED);
-    item.hwndItem = hwnd;
-    item.hDC = &canvas;
-    item.rcItem = inside;
-    item.itemData = static_cast<UINT_PTR>(tabs_[static_cast<std::size_t>(index)].param);
     canvas.Dc().SetTextColor(TextColor(hwnd));
-    ::SendMessage(::GetParent(hwnd), WM_DRAWITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
+    AskOwnerToDraw(hwnd, canvas, ODT_TAB, static_cast<UINT>(index), index == selected_ ? ODS_SELECTED : 0, inside,
+                   static_cast<UINT_PTR>(tabs_[static_cast<std::size_t>(index)].param));
   }
 
   std::vector<Tab> tabs_;
