@@ -13,6 +13,7 @@
 #include "app/build_2d_command.h"
 #include "app/drawing_summary.h"
 #include "app/plugin_session.h"
+#include "app/ui_gallery_command.h"
 #include "app/view_edit.h"
 #include "app/views_summary.h"
 #include "samples/sample_drawing.h"
@@ -81,6 +82,8 @@ int main(int argc, char** argv) {
   addCamera->add_option("--display-mode", camera.displayMode, "Display mode 0 (Geometric) to 10 (Render)")
       ->check(CLI::Range(0, 10));
   addCamera->add_flag("--no-tick", noTick, "Do not tick the camera for 2D");
+
+  app::AddUiGalleryCommand(app);
 
   CLI11_PARSE(app, argc, argv);
 

@@ -1,11 +1,17 @@
 // The window classes the framework brings, registered once on first need. A new control class
 // adds its Register function here.
 #include "framework/controls/button.h"
+#include "framework/controls/combo_box.h"
 #include "framework/controls/edit.h"
+#include "framework/controls/header_ctrl.h"
+#include "framework/controls/list_ctrl.h"
+#include "framework/controls/progress_ctrl.h"
+#include "framework/controls/scroll_bar.h"
 #include "framework/controls/static_control.h"
 #include "framework/controls/tab_control.h"
 #include "framework/controls/tool_tip.h"
 #include "framework/controls/tree_control.h"
+#include "framework/menu.h"
 #include "framework/window_table.h"
 
 namespace framework {
@@ -25,6 +31,12 @@ void EnsureBuiltInClasses() {
   RegisterTabControlClass();
   RegisterTreeViewClass();
   RegisterToolTipClass();
+  RegisterScrollBarClass();
+  RegisterComboBoxClasses();
+  RegisterHeaderClass();
+  RegisterListViewClass();
+  RegisterProgressClass();
+  RegisterPopupMenuClass();
 }
 
 }  // namespace detail

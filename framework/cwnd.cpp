@@ -287,6 +287,12 @@ BOOL CWnd::OnWndMsg(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result)
     const auto* item = reinterpret_cast<const DRAWITEMSTRUCT*>(lParam);
     if (ReflectLastMsg(item->hwndItem, message, wParam, lParam, result)) return TRUE;
   }
+  if (message == WM_MEASUREITEM && lParam != 0) {
+    // The record names its control by id only.
+    const auto* item = reinterpret_cast<const MEASUREITEMSTRUCT*>(lParam);
+    const HWND control = ::GetDlgItem(m_hWnd, static_cast<int>(item->CtlID));
+    if (item->CtlType != ODT_MENU && control && ReflectLastMsg(control, message, wParam, lParam, result)) return TRUE;
+  }
   if (!IsNotifyKind(message) && DispatchToMap(message, 0, 0, true, wParam, lParam, *result)) return TRUE;
   return DispatchStandardMessage(message, wParam, lParam, result);
 }

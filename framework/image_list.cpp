@@ -104,6 +104,17 @@ BOOL CImageList::Create(int cx, int cy, UINT flags, int initial, int grow) {
   return m_hImageList ? TRUE : FALSE;
 }
 
+BOOL CImageList::Create(UINT bitmapId, int cx, int grow, COLORREF) {
+  DeleteImageList();
+  const std::string_view strip = framework::IconPicture(AfxLoadIcon(bitmapId));
+  if (strip.empty() || cx <= 0) return FALSE;
+  const SIZE size = framework::PictureSize(strip);
+  const int count = size.cx / cx;
+  if (!Create(cx, size.cy, ILC_COLOR | ILC_MASK, count, grow)) return FALSE;
+  for (int i = 0; i < count; ++i) Add(framework::LoadPictureSlice(bitmapId, i, cx));
+  return TRUE;
+}
+
 BOOL CImageList::DeleteImageList() {
   if (!m_hImageList) return FALSE;
   ImageList_Destroy(m_hImageList);

@@ -43,6 +43,9 @@ class CImageList {
   HIMAGELIST m_hImageList;
 
   BOOL Create(int cx, int cy, UINT flags, int initial, int grow);
+  // The images of a bitmap strip, each `cx` pixels wide and as tall as the strip. Pictures are
+  // transparent where they draw nothing, so the mask colour is not needed to cut them out.
+  BOOL Create(UINT bitmapId, int cx, int grow, COLORREF mask);
   BOOL DeleteImageList();
   HIMAGELIST GetSafeHandle() const { return m_hImageList; }
   int Add(HICON icon);

@@ -31,6 +31,15 @@ std::string_view ApplicationName();
 std::string_view IconPicture(HICON icon);
 // The id an icon was loaded by (0 for none), so that renders and tests can say which icon shows.
 UINT IconResourceId(HICON icon);
+// Bitmaps share the pictures of icons.
+std::string_view BitmapPicture(HBITMAP bitmap);
+UINT BitmapResourceId(HBITMAP bitmap);
+
+// The size a picture is drawn at: the width and height of its viewBox (16 x 16 without one).
+SIZE PictureSize(std::string_view svg);
+// Image `index` of a bitmap strip whose images are `width` pixels wide, as an icon of its own
+// (the same slice gives the same handle); null when the strip has no such image.
+HICON LoadPictureSlice(UINT id, int index, int width);
 
 }  // namespace framework
 
@@ -40,3 +49,5 @@ std::string AfxLoadString(UINT id);
 // handle. A null handle when the picture does not exist.
 HICON AfxLoadIcon(UINT id);
 const DialogTemplate* AfxFindDialogTemplate(UINT id);
+// The bitmap of a resource id; a null handle when the picture does not exist.
+HBITMAP AfxLoadBitmap(UINT id);

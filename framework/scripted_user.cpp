@@ -3,10 +3,14 @@
 
 #include <vector>
 
+#include "framework/controls/combo_box.h"
+#include "framework/controls/list_ctrl.h"
 #include "framework/controls/tab_control.h"
 #include "framework/controls/tree_control.h"
 #include "framework/geometry.h"
 #include "framework/input.h"
+#include "framework/menu.h"
+#include "framework/window_classes.h"
 #include "framework/window_system.h"
 
 namespace framework {
@@ -74,6 +78,23 @@ std::string ItemText(HWND tree, HTREEITEM item) {
   ::SendMessage(tree, TVM_GETITEM, 0, reinterpret_cast<LPARAM>(&t));
   return buffer;
 }
+
+std::string WithoutMnemonics(std::string_view text) { return VisibleText(text); }
+
+HWND ChildOfClass(HWND parent, std::string_view className) {
+  for (HWND child : GetChildren(parent)) {
+    if (::GetClassName(child) == className && ::IsWindowVisible(child)) return child;
+  }
+  return HWND();
+}
+
+CRect ClientOf(HWND window) {
+  RECT r;
+  ::GetClientRect(window, &r);
+  return r;
+}
+
+HMENU MenuOf(HWND menuWindow) { return HMENU::FromParam(::SendMessage(menuWindow, MN_GETHMENU, 0, 0)); }
 
 }  // namespace
 
@@ -273,6 +294,183 @@ void ScriptedUser::SelectTab(HWND tabs, int index) {
     throw ScriptError("no tab " + std::to_string(index));
   }
   Click(tabs, CRect(r).CenterPoint());
+}
+
+void ScriptedUser::ScrollIntoView(HWND scrollable, const std::function<CRect()>& place, const CRect& view) {
+  // Each click moves the list by one row, so the clicks are bounded by the rows there are.
+  for (int clicks = 0; clicks < 100000; ++clicks) {
+    const CRect r = place();
+    const bool above = r.top < view.top;
+    const bool below = r.bottom > view.bottom;
+    if (!above && !below) return;
+    const HWND bar = ChildOfClass(scrollable, kScrollBarClass);
+    if (!bar) throw ScriptError("the item is out of view and the list shows no scroll bar");
+    const CRect track = ClientOf(bar);
+    const int before = static_cast<int>(::SendMessage(bar, SBM_GETPOS, 0, 0));
+    Click(bar, CPoint(track.CenterPoint().x, above ? track.top + 4 : track.bottom - 5));
+    if (static_cast<int>(::SendMessage(bar, SBM_GETPOS, 0, 0)) == before) throw ScriptError("the list does not scroll to the item");
+  }
+}
+
+void ScriptedUser::ChooseComboItem(HWND combo, int index) {
+  if (index < 0 || index >= static_cast<int>(::SendMessage(combo, CB_GETCOUNT, 0, 0))) {
+    throw ScriptError("the combo box has no item " + std::to_string(index));
+  }
+  if (!::SendMessage(combo, CB_GETDROPPEDSTATE, 0, 0)) Click(combo);
+  COMBOBOXINFO info;
+  ::SendMessage(combo, CB_GETCOMBOBOXINFO, 0, reinterpret_cast<LPARAM>(&info));
+  const HWND list = info.hwndList;
+  if (!list) throw ScriptError("the combo box dropped no list");
+  const auto itemRect = [list, index] {
+    RECT r;
+    ::SendMessage(list, LB_GETITEMRECT, static_cast<WPARAM>(index), reinterpret_cast<LPARAM>(&r));
+    return CRect(r);
+  };
+  ScrollIntoView(list, itemRect, ClientOf(list));
+  Click(list, itemRect().CenterPoint());
+  if (static_cast<int>(::SendMessage(combo, CB_GETCURSEL, 0, 0)) != index) {
+    throw ScriptError("the combo box did not take item " + std::to_string(index));
+  }
+}
+
+void ScriptedUser::ChooseComboItem(HWND combo, std::string_view text) {
+  const int count = static_cast<int>(::SendMessage(combo, CB_GETCOUNT, 0, 0));
+  for (int i = 0; i < count; ++i) {
+    const auto length = ::SendMessage(combo, CB_GETLBTEXTLEN, static_cast<WPARAM>(i), 0);
+    std::string item(static_cast<std::size_t>(std::max<LRESULT>(0, length)) + 1, '\0');
+    ::SendMessage(combo, CB_GETLBTEXT, static_cast<WPARAM>(i), reinterpret_cast<LPARAM>(item.data()));
+    item.resize(static_cast<std::size_t>(std::max<LRESULT>(0, length)));
+    if (item == text) {
+      ChooseComboItem(combo, i);
+      return;
+    }
+  }
+  throw ScriptError("the combo box has no item \"" + std::string(text) + "\"");
+}
+
+HWND ScriptedUser::OpenMenu() const {
+  const std::vector<HWND> windows = TopLevelWindows();
+  for (auto it = windows.rbegin(); it != windows.rend(); ++it) {
+    if (::GetClassName(*it) == kPopupMenuClass && ::IsWindowVisible(*it)) return *it;
+  }
+  throw ScriptError("no menu is open");
+}
+
+std::vector<std::string> ScriptedUser::MenuItemTexts() const {
+  const HMENU menu = MenuOf(OpenMenu());
+  std::vector<std::string> texts;
+  for (int i = 0; i < ::GetMenuItemCount(menu); ++i) {
+    if ((::GetMenuState(menu, static_cast<UINT>(i), MF_BYPOSITION) & MF_SEPARATOR) != 0) continue;
+    texts.push_back(WithoutMnemonics(::GetMenuString(menu, static_cast<UINT>(i), MF_BYPOSITION)));
+  }
+  return texts;
+}
+
+void ScriptedUser::ChooseMenuItem(int commandId) {
+  const HWND window = OpenMenu();
+  const HMENU menu = MenuOf(window);
+  for (int i = 0; i < ::GetMenuItemCount(menu); ++i) {
+    if (::GetMenuItemID(menu, i) != static_cast<UINT>(commandId)) continue;
+    RECT r;
+    ::GetMenuItemRect(window, menu, static_cast<UINT>(i), &r);
+    POINT centre = CRect(r).CenterPoint();
+    ::ScreenToClient(window, &centre);
+    Click(window, centre);
+    return;
+  }
+  throw ScriptError("the menu has no item " + std::to_string(commandId));
+}
+
+void ScriptedUser::ChooseMenuItem(std::string_view text) {
+  const HMENU menu = MenuOf(OpenMenu());
+  for (int i = 0; i < ::GetMenuItemCount(menu); ++i) {
+    if (WithoutMnemonics(::GetMenuString(menu, static_cast<UINT>(i), MF_BYPOSITION)) == WithoutMnemonics(text)) {
+      ChooseMenuItem(static_cast<int>(::GetMenuItemID(menu, i)));
+      return;
+    }
+  }
+  throw ScriptError("the menu has no item \"" + std::string(text) + "\"");
+}
+
+void ScriptedUser::DismissMenu() {
+  OpenMenu();
+  Press(VK_ESCAPE);
+}
+
+void ScriptedUser::AnswerNextWithMenuItem(int commandId) {
+  AnswerNext([commandId](ScriptedUser& u, HWND) { u.ChooseMenuItem(commandId); });
+}
+
+void ScriptedUser::AnswerNextWithMenuItem(std::string_view text) {
+  AnswerNext([item = std::string(text)](ScriptedUser& u, HWND) { u.ChooseMenuItem(item); });
+}
+
+void ScriptedUser::AnswerNextByDismissingMenu() {
+  AnswerNext([](ScriptedUser& u, HWND) { u.DismissMenu(); });
+}
+
+CRect ScriptedUser::ListCell(HWND list, int row, int column) {
+  if (row < 0 || row >= static_cast<int>(::SendMessage(list, LVM_GETITEMCOUNT, 0, 0))) {
+    throw ScriptError("the list has no row " + std::to_string(row));
+  }
+  const auto cell = [list, row, column] {
+    RECT r;
+    r.top = column;
+    r.left = column == 0 ? LVIR_LABEL : LVIR_BOUNDS;
+    if (!::SendMessage(list, LVM_GETSUBITEMRECT, static_cast<WPARAM>(row), reinterpret_cast<LPARAM>(&r))) {
+      throw ScriptError("the list has no column " + std::to_string(column));
+    }
+    return CRect(r);
+  };
+  CRect rows = ClientOf(list);
+  const HWND header = HWND::FromParam(::SendMessage(list, LVM_GETHEADER, 0, 0));
+  if (::IsWindowVisible(header)) rows.top += ClientOf(header).Height();
+  ScrollIntoView(list, cell, rows);
+  return cell();
+}
+
+void ScriptedUser::ClickListHeader(HWND list, int column) {
+  const HWND header = HWND::FromParam(::SendMessage(list, LVM_GETHEADER, 0, 0));
+  RECT r;
+  if (!::IsWindowVisible(header) || !::SendMessage(header, HDM_GETITEMRECT, static_cast<WPARAM>(column), reinterpret_cast<LPARAM>(&r))) {
+    throw ScriptError("the list shows no column header " + std::to_string(column));
+  }
+  Click(header, CRect(r).CenterPoint());
+}
+
+void ScriptedUser::ClickListCell(HWND list, int row, int column) { Click(list, ListCell(list, row, column).CenterPoint()); }
+
+void ScriptedUser::DoubleClickListCell(HWND list, int row, int column) {
+  DoubleClick(list, ListCell(list, row, column).CenterPoint());
+}
+
+void ScriptedUser::ToggleListCheck(HWND list, int row) {
+  const CRect cell = ListCell(list, row, 0);
+  const int y = cell.CenterPoint().y;
+  for (int x = 0; x < cell.right; ++x) {
+    LVHITTESTINFO info;
+    info.pt = {x, y};
+    ::SendMessage(list, LVM_HITTEST, 0, reinterpret_cast<LPARAM>(&info));
+    if (info.iItem == row && (info.flags & LVHT_ONITEMSTATEICON) != 0) {
+      Click(list, CPoint(x + 6, y));
+      return;
+    }
+  }
+  throw ScriptError("row " + std::to_string(row) + " shows no check box");
+}
+
+void ScriptedUser::EditListCell(HWND list, int row, int column, std::string_view text, UINT endKey) {
+  const UINT wanted = LVIS_SELECTED | LVIS_FOCUSED;
+  if (static_cast<UINT>(::SendMessage(list, LVM_GETITEMSTATE, static_cast<WPARAM>(row), wanted)) != wanted) {
+    ClickListCell(list, row, column);
+  }
+  ClickListCell(list, row, column);
+  const HWND editor = ::GetFocus();
+  if (!editor || ::GetParent(editor) != list || ::GetClassName(editor) != kEditClass) {
+    throw ScriptError("the list opened no editor on row " + std::to_string(row) + ", column " + std::to_string(column));
+  }
+  Type(text);
+  Press(endKey);
 }
 
 }  // namespace framework

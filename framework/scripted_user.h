@@ -10,8 +10,11 @@
 #include <stdexcept>
 #include <string>
 #include <string_view>
+#include <vector>
 
+#include "framework/geometry.h"
 #include "framework/message_queue.h"
+#include "framework/win_constants.h"
 #include "framework/win_types.h"
 
 namespace framework {
@@ -76,10 +79,41 @@ class ScriptedUser final : public InputSource {
   // Clicks a tab of a tab control.
   void SelectTab(HWND tabs, int index);
 
+  // Combo boxes: drops the list with a click on the combo, scrolls the list to the item with
+  // its scroll bar and clicks the item; the text is matched exactly.
+  void ChooseComboItem(HWND combo, std::string_view text);
+  void ChooseComboItem(HWND combo, int index);
+
+  // Popup menus. A menu waits for its answer like a modal dialog: queue the choice before the
+  // click that opens the menu (AnswerNextWithMenuItem), or act on it inside an answer.
+  HWND OpenMenu() const;  // the menu showing now
+  std::vector<std::string> MenuItemTexts() const;  // its items as shown, separators left out
+  void ChooseMenuItem(int commandId);
+  void ChooseMenuItem(std::string_view text);
+  void DismissMenu();  // Escape
+  void AnswerNextWithMenuItem(int commandId);
+  void AnswerNextWithMenuItem(std::string_view text);
+  void AnswerNextByDismissingMenu();
+
+  // Report lists, by row and column index; a row out of view is scrolled to with the list's
+  // scroll bar first.
+  void ClickListHeader(HWND list, int column);
+  void ClickListCell(HWND list, int row, int column);
+  void DoubleClickListCell(HWND list, int row, int column);
+  void ToggleListCheck(HWND list, int row);
+  // Edits a cell in place: selects the row, clicks the cell again, types the text over the
+  // editor's (which starts all selected) and ends with `endKey` (Enter, Tab, Escape, Up or
+  // Down). Throws ScriptError when no editor opens.
+  void EditListCell(HWND list, int row, int column, std::string_view text, UINT endKey = VK_RETURN);
+
  private:
   bool AwaitInput(HWND modalWindow) override;
   POINT ItemPart(HWND tree, HTREEITEM item, UINT part);
   void ShowItem(HWND tree, HTREEITEM item);
+  // Clicks the arrows of the scroll bar of `scrollable` until `place` (answering where the
+  // thing lies now, in the window's client pixels) lies within `view`.
+  void ScrollIntoView(HWND scrollable, const std::function<CRect()>& place, const CRect& view);
+  CRect ListCell(HWND list, int row, int column);
 
   std::deque<Answer> answers_;
   int unanswered_ = 0;

@@ -93,6 +93,8 @@ constexpr UINT VK_RIGHT = 0x27;
 constexpr UINT VK_DOWN = 0x28;
 constexpr UINT VK_DELETE = 0x2E;
 constexpr UINT VK_F2 = 0x71;
+constexpr UINT VK_F4 = 0x73;
+constexpr UINT VK_MENU = 0x12;  // Alt
 
 // Mouse key-state bits of mouse messages.
 constexpr WPARAM MK_LBUTTON = 0x0001;
@@ -126,6 +128,9 @@ constexpr int BST_CHECKED = 1;
 constexpr int BST_INDETERMINATE = 2;
 constexpr int BST_PUSHED = 4;
 constexpr int BST_FOCUS = 8;
+
+// The state image of a tree or list item (its check box: 1 unchecked, 2 checked) as state bits.
+constexpr UINT INDEXTOSTATEIMAGEMASK(UINT index) { return index << 12; }
 
 // Image kinds of BM_SETIMAGE.
 constexpr WPARAM IMAGE_BITMAP = 0;
@@ -199,3 +204,4 @@ constexpr UINT ODS_GRAYED = 0x0002;
 constexpr UINT ODS_DISABLED = 0x0004;
 constexpr UINT ODS_CHECKED = 0x0008;
 constexpr UINT ODS_FOCUS = 0x0010;
+constexpr UINT ODS_COMBOBOXEDIT = 0x1000;  // the selection field of a combo box, not its list

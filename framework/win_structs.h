@@ -24,6 +24,18 @@ struct DRAWITEMSTRUCT {
 };
 using LPDRAWITEMSTRUCT = DRAWITEMSTRUCT*;
 
+// WM_MEASUREITEM: an owner-drawn control asks its parent how tall its items are; the record
+// comes with the height the system proposes.
+struct MEASUREITEMSTRUCT {
+  UINT CtlType = 0;
+  UINT CtlID = 0;
+  UINT itemID = 0;
+  UINT itemWidth = 0;
+  UINT itemHeight = 0;
+  UINT_PTR itemData = 0;
+};
+using LPMEASUREITEMSTRUCT = MEASUREITEMSTRUCT*;
+
 // WM_CREATE and WM_NCCREATE: what the window is being created with.
 struct CREATESTRUCT {
   LPARAM lpCreateParams = 0;

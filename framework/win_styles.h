@@ -109,19 +109,44 @@ constexpr DWORD LVS_SMALLICON = 0x0002;
 constexpr DWORD LVS_LIST = 0x0003;
 constexpr DWORD LVS_SINGLESEL = 0x0004;
 constexpr DWORD LVS_SHOWSELALWAYS = 0x0008;
+constexpr DWORD LVS_SORTASCENDING = 0x0010;
+constexpr DWORD LVS_SHAREIMAGELISTS = 0x0040;
+constexpr DWORD LVS_NOLABELWRAP = 0x0080;
 constexpr DWORD LVS_EDITLABELS = 0x0200;
 constexpr DWORD LVS_NOSCROLL = 0x2000;
+constexpr DWORD LVS_NOCOLUMNHEADER = 0x4000;
+constexpr DWORD LVS_NOSORTHEADER = 0x8000;
+constexpr DWORD LVS_TYPEMASK = 0x0003;
+
+// Extended list-view styles (LVM_SETEXTENDEDLISTVIEWSTYLE).
+constexpr DWORD LVS_EX_GRIDLINES = 0x0001;
+constexpr DWORD LVS_EX_SUBITEMIMAGES = 0x0002;
+constexpr DWORD LVS_EX_CHECKBOXES = 0x0004;
+constexpr DWORD LVS_EX_FULLROWSELECT = 0x0020;
+
+// Header styles.
+constexpr DWORD HDS_HORZ = 0x0000;
+constexpr DWORD HDS_BUTTONS = 0x0002;
+constexpr DWORD HDS_HIDDEN = 0x0008;
+
+// Scroll-bar styles.
+constexpr DWORD SBS_HORZ = 0x0000;
+constexpr DWORD SBS_VERT = 0x0001;
 
 // Combo-box styles.
+constexpr DWORD CBS_SIMPLE = 0x0001;
 constexpr DWORD CBS_DROPDOWN = 0x0002;
 constexpr DWORD CBS_DROPDOWNLIST = 0x0003;
 constexpr DWORD CBS_OWNERDRAWFIXED = 0x0010;
+constexpr DWORD CBS_OWNERDRAWVARIABLE = 0x0020;
 constexpr DWORD CBS_AUTOHSCROLL = 0x0040;
 constexpr DWORD CBS_SORT = 0x0100;
 constexpr DWORD CBS_HASSTRINGS = 0x0200;
+constexpr DWORD CBS_TYPEMASK = 0x0003;
 
 // Progress-bar styles.
 constexpr DWORD PBS_SMOOTH = 0x0001;
+constexpr DWORD PBS_VERTICAL = 0x0004;
 
 // Tool-tip styles and tool flags.
 constexpr DWORD TTS_ALWAYSTIP = 0x0001;

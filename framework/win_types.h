@@ -51,6 +51,9 @@ using HWND = Handle<struct WindowTag>;
 using HTREEITEM = Handle<struct TreeItemTag>;
 using HICON = Handle<struct IconTag>;
 using HIMAGELIST = Handle<struct ImageListTag>;
+using HMENU = Handle<struct MenuTag>;
+using HBITMAP = Handle<struct BitmapTag>;
+using HMODULE = Handle<struct ModuleTag>;
 
 class Canvas;
 using HDC = Canvas*;  // a device context is the canvas a window paints into

@@ -15,6 +15,10 @@ inline constexpr std::string_view kToolTipClass = "tooltips_class32";
 inline constexpr std::string_view kListViewClass = "SysListView32";
 inline constexpr std::string_view kComboBoxClass = "ComboBox";
 inline constexpr std::string_view kComboBoxExClass = "ComboBoxEx32";
+inline constexpr std::string_view kComboListClass = "ComboLBox";
+inline constexpr std::string_view kHeaderClass = "SysHeader32";
+inline constexpr std::string_view kScrollBarClass = "ScrollBar";
 inline constexpr std::string_view kProgressClass = "msctls_progress32";
+inline constexpr std::string_view kPopupMenuClass = "#32768";
 
 }  // namespace framework

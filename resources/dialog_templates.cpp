@@ -3,8 +3,13 @@
 
 namespace resources {
 
+std::vector<const DialogTemplate*> AllDialogTemplates() {
+  return {&ManagerPaneTemplate(),    &CameraSettingsTemplate(), &SectionSettingsTemplate(), &LayerSettingsTemplate(),
+          &ProgressTemplate(),       &SelectionsTemplate(),     &SelectionNameTemplate()};
+}
+
 const DialogTemplate* FindDialogTemplate(UINT id) {
-  for (const DialogTemplate* t : {&ManagerPaneTemplate(), &ProgressTemplate(), &SelectionsTemplate(), &SelectionNameTemplate()}) {
+  for (const DialogTemplate* t : AllDialogTemplates()) {
     if (static_cast<UINT>(t->id) == id) return t;
   }
   return nullptr;

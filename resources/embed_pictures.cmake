@@ -1,10 +1,15 @@
-# Writes a C++ source that holds each picture file of icons/ as a string, found by the number
-# its name starts with ("5002_add_new.svg" is picture 5002).
+# Writes a C++ source that holds each picture file of the folders INPUT_DIRS (icons/ and
+# bitmaps/) as a string, found by the number its name starts with ("5002_add_new.svg" is
+# picture 5002).
 file(WRITE "${OUTPUT}" "// Built from resources/icons by embed_pictures.cmake; do not edit.\n")
 file(APPEND "${OUTPUT}" "#include \"resources/resource_module.h\"\n\nnamespace resources {\nnamespace {\n")
 file(APPEND "${OUTPUT}" "struct Picture {\n  UINT id;\n  std::string_view svg;\n};\n")
 file(APPEND "${OUTPUT}" "constexpr Picture kPictures[] = {\n")
-file(GLOB INPUTS "${INPUT_DIR}/*.svg")
+set(INPUTS)
+foreach(dir IN LISTS INPUT_DIRS)
+  file(GLOB found "${dir}/*.svg")
+  list(APPEND INPUTS ${found})
+endforeach()
 list(SORT INPUTS)
 foreach(input IN LISTS INPUTS)
   get_filename_component(name "${input}" NAME)

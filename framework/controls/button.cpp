@@ -155,17 +155,28 @@ class ButtonBehaviour : public ControlBehaviour {
     canvas.FrameRect(r, pushed_ ? RGB(0, 84, 153) : (isDefault || HasFocus(hwnd)) ? RGB(0, 120, 215) : RGB(173, 173, 173),
                      isDefault ? 2 : 1);
     const std::string_view picture = IconPicture(icon_);
+    const std::string text = ::GetWindowText(hwnd);
+    const int shift = pushed_ ? 1 : 0;
     if (!picture.empty()) {
+      // An icon alone sits in the middle; with a text it leads the text.
       const int size = std::min({16, r.Width() - 4, r.Height() - 4});
-      const CPoint at(r.left + (r.Width() - size) / 2 + (pushed_ ? 1 : 0), r.top + (r.Height() - size) / 2 + (pushed_ ? 1 : 0));
+      const CPoint at(text.empty() ? r.left + (r.Width() - size) / 2 + shift : r.left + 5 + shift,
+                      r.top + (r.Height() - size) / 2 + shift);
       canvas.Picture(CRect(at, CSize(size, size)), picture, !enabled,
                      {{"data-icon", std::to_string(IconResourceId(icon_))}});
+      if (!text.empty()) {
+        CDC& dc = canvas.Dc();
+        dc.SetBkMode(TRANSPARENT);
+        dc.SetTextColor(TextColor(hwnd));
+        CRect label(at.x + size + 5, r.top + shift, r.right - 4, r.bottom + shift);
+        dc.DrawText(text, &label, DT_LEFT | DT_VCENTER | DT_SINGLELINE | DT_END_ELLIPSIS);
+      }
     } else {
       CDC& dc = canvas.Dc();
       dc.SetBkMode(TRANSPARENT);
       dc.SetTextColor(TextColor(hwnd));
-      CRect text = r;
-      dc.DrawText(::GetWindowText(hwnd), &text, DT_CENTER | DT_VCENTER | DT_SINGLELINE);
+      CRect label = r;
+      dc.DrawText(text, &label, DT_CENTER | DT_VCENTER | DT_SINGLELINE);
     }
     if (HasFocus(hwnd)) {
       CRect focus = r;

@@ -23,7 +23,6 @@ constexpr UINT TVIS_BOLD = 0x0010;
 constexpr UINT TVIS_EXPANDED = 0x0020;
 constexpr UINT TVIS_EXPANDEDONCE = 0x0040;
 constexpr UINT TVIS_STATEIMAGEMASK = 0xF000;
-constexpr UINT INDEXTOSTATEIMAGEMASK(UINT index) { return index << 12; }
 
 inline constexpr HTREEITEM TVI_ROOT{0xFFFF0000U};
 inline constexpr HTREEITEM TVI_FIRST{0xFFFF0001U};
