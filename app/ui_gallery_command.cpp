@@ -297,8 +297,8 @@ void Icons(Gallery& gallery) {
   }
   int height = 10;
   for (UINT id : ids) height += std::max(32, static_cast<int>(framework::PictureSize(framework::IconPicture(AfxLoadIcon(id))).cy) * 2) + 14;
-  Canvas canvas(820, height);
-  canvas.FillRect(CRect(0, 0, 820, height), RGB(255, 255, 255));
+  Canvas canvas(860, height);
+  canvas.FillRect(CRect(0, 0, 860, height), RGB(255, 255, 255));
   int top = 10;
   for (UINT id : ids) {
     const std::string_view picture = framework::IconPicture(AfxLoadIcon(id));

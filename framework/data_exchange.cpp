@@ -123,3 +123,13 @@ void DDX_Check(CDataExchange* dx, int id, int& value) {
     ::SendMessage(hwnd, BM_SETCHECK, static_cast<WPARAM>(value), 0);
   }
 }
+
+void DDX_CBIndex(CDataExchange* dx, int id, int& index) {
+  const HWND hwnd = dx->PrepareCtrl(id);
+  if (!hwnd) return;
+  if (dx->m_bSaveAndValidate) {
+    index = static_cast<int>(::SendMessage(hwnd, CB_GETCURSEL, 0, 0));
+  } else {
+    ::SendMessage(hwnd, CB_SETCURSEL, static_cast<WPARAM>(index), 0);
+  }
+}

@@ -35,3 +35,5 @@ void DDX_Text(CDataExchange* dx, int id, int& value);
 void DDX_Text(CDataExchange* dx, int id, double& value);
 void DDX_Text(CDataExchange* dx, int id, float& value);
 void DDX_Check(CDataExchange* dx, int id, int& value);
+// The selected index of a combo box (-1 for none; an index it does not have selects nothing).
+void DDX_CBIndex(CDataExchange* dx, int id, int& index);
