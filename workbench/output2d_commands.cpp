@@ -111,6 +111,8 @@ host::Status MergeSources() {
   try {
     draft::Sheet merged = std::move(sources.front());
     for (std::size_t i = 1; i < sources.size(); ++i) merged = draft::MergeSheets(merged, sources[i]);
+    // An empty drawing is what a view that failed to come out looks like; it is never saved.
+    if (merged.strokes.empty() && merged.labels.empty()) return 0;
     draft::WriteSheetFiles(merged, state.sourceTarget, replace);
   } catch (const std::exception&) {
     return 0;  // the old files stay as they were

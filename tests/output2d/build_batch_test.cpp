@@ -104,6 +104,7 @@ TEST_F(BuildBatchTest, ModesWalkTheirOwnViewsAndAllTakesCamerasThenSectionsThenP
 }
 
 TEST_F(BuildBatchTest, CameraWithItsOwnFileNameIsSavedThereNotInTheFolder) {
+  AddCube();
   std::filesystem::create_directory(Folder() / "elsewhere");
   const std::string own = (Folder() / "elsewhere" / "front elevation").string();
   AddCamera("Front", kFront, true, own);
@@ -116,6 +117,7 @@ TEST_F(BuildBatchTest, CameraWithItsOwnFileNameIsSavedThereNotInTheFolder) {
 }
 
 TEST_F(BuildBatchTest, HostileViewNamesStayInsideTheFolderAsValidFileNames) {
+  AddCube();
   std::string accents;
   for (int i = 0; i < 300; ++i) accents += "\xC3\xA9";  // e acute, two bytes
   const Strings names = {"../x", "a/b", "..", ".", "back\\slash:colon*star?query\"<>|", "tab\tbell\a\x7f" "end",
