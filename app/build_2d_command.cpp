@@ -3,13 +3,13 @@
 
 #include <filesystem>
 
+#include "app/drawing_access.h"
 #include "app/plugin_session.h"
 #include "resources/string_table.h"
 #include "samples/sample_drawing.h"
 #include "shell/host/argument_blocks.h"
 #include "views/hr_camera_mgr.h"
 #include "views/view_collection.h"
-#include "workbench/drawing_file.h"
 #include "workbench/workbench.h"
 
 namespace app {
@@ -46,7 +46,7 @@ int RunBuild2D(const Build2DOptions& options, std::ostream& out, std::ostream& e
       (sample ? std::filesystem::absolute(options.outputDir.empty() ? "." : options.outputDir) / "sample.pdx"
               : std::filesystem::absolute(options.drawing))
           .lexically_normal();
-  PluginSession session(sample ? samples::MakeSampleDrawing() : wb::OpenDrawingFile(drawingPath));
+  PluginSession session(sample ? samples::MakeSampleDrawing() : ReadDrawing(drawingPath));
   wb::Workbench::Get().SetDrawingPath(db.handle, drawingPath.string());
 
   SetDatabase(db.handle);

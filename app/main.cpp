@@ -11,6 +11,7 @@
 #include <vector>
 
 #include "app/build_2d_command.h"
+#include "app/drawing_access.h"
 #include "app/drawing_summary.h"
 #include "app/plugin_session.h"
 #include "app/view_edit.h"
@@ -22,15 +23,7 @@ namespace {
 
 wb::Drawing LoadOrSample(const std::string& path) {
   if (path.empty()) return samples::MakeSampleDrawing();
-  return wb::OpenDrawingFile(path);
-}
-
-// Opens a drawing file with the plug-in loaded, runs an edit and saves the drawing back.
-template <typename Edit>
-void EditDrawing(const std::string& path, Edit edit) {
-  const app::PluginSession session(wb::OpenDrawingFile(path));
-  edit();
-  wb::SaveDrawingFile(session.Drawing(), path);
+  return app::ReadDrawing(path);
 }
 
 }  // namespace
@@ -103,13 +96,13 @@ int main(int argc, char** argv) {
       std::cout << "Wrote the sample drawing to " << samplePath << '\n';
     } else if (*tick || *untick) {
       const bool ticking = tick->parsed();
-      EditDrawing(tickPath, [&] { app::SetTicks(tickViews, ticking); });
+      app::EditDrawing(tickPath, [&] { app::SetTicks(tickViews, ticking); });
       std::cout << (ticking ? "Ticked " : "Unticked ") << tickViews.size() << " views in " << tickPath << '\n';
     } else if (*addCamera) {
       std::copy(eye.begin(), eye.end(), camera.eye.begin());
       std::copy(target.begin(), target.end(), camera.target.begin());
       camera.tick = !noTick;
-      EditDrawing(cameraPath, [&] { app::AddCamera(camera); });
+      app::EditDrawing(cameraPath, [&] { app::AddCamera(camera); });
       std::cout << "Added camera \"" << camera.name << "\" to " << cameraPath << '\n';
     }
   } catch (const std::exception& error) {

@@ -36,6 +36,7 @@ std::string Message(Reason reason, const std::string& path, const std::string& d
     case Reason::Damaged: return "drawing file is damaged: " + path + inBrackets;
     case Reason::NewerVersion: return "drawing file is from a newer version of Pandex: " + path + inBrackets;
     case Reason::CannotWrite: return "cannot write " + path + ": " + detail;
+    case Reason::InUse: return "drawing file " + path + " is in use by another program" + inBrackets;
   }
   return detail;
 }

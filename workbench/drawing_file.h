@@ -19,6 +19,7 @@ class DrawingFileError : public std::runtime_error {
     Damaged,       // a drawing file whose content does not hold together
     NewerVersion,  // written by a later Pandex in a format this one does not know
     CannotWrite,   // the save failed; the previous file is untouched
+    InUse,         // another program holds the drawing locked (see DrawingFileLock)
   };
 
   DrawingFileError(Reason reason, const std::string& message) : std::runtime_error(message), reason_(reason) {}

@@ -55,6 +55,15 @@ check add-camera-not-a-number 1 '^pandex: the eye and the target must be numbers
 check add-camera-no-target 106 'target is required' -- "$pandex" add-camera "$work/views.pdx" N --eye 1 2 3
 check build-2d-bad-mode 105 'bogus not in' -- "$pandex" build-2d --mode bogus
 check build-2d-missing 1 '^pandex: .+none\.pdx' -- "$pandex" build-2d "$work/none.pdx"
+# Two editors at once: each waits for the other, and both cameras are kept.
+"$pandex" sample "$work/busy.pdx" >/dev/null
+for pair in 1 2 3 4 5 6 7 8; do
+  "$pandex" add-camera "$work/busy.pdx" "P$pair" --eye 1 2 3 --target 0 0 0 >/dev/null &
+  "$pandex" add-camera "$work/busy.pdx" "Q$pair" --eye 1 2 3 --target 0 0 0 >/dev/null &
+  wait
+done
+added_cameras() { "$pandex" info "$1" | grep -cE '^  \[x\] [PQ][1-8] '; }
+check concurrent-edits-keep-both 0 '^16$' -- added_cameras "$work/busy.pdx"
 mkdir "$work/blocked" && cp "$work/views.pdx" "$work/blocked/views.pdx" && : >"$work/blocked/2D_"
 check build-2d-no-folder 1 '^pandex: Cannot create 2D folder\. \(.*/blocked/2D_\)' -- \
   "$pandex" build-2d "$work/blocked/views.pdx"
