@@ -146,6 +146,19 @@ void CheckFileHeader(const OpenedFile& file, const std::filesystem::path& path) 
   if (size != expectedSize) Refuse(Reason::Damaged, path, "its size does not match its header");
 }
 
+// The file at the end of a chain of symbolic links: a save replaces that file and keeps the
+// links, so that editing through a link changes the drawing it leads to.
+std::filesystem::path FileBehindLinks(const std::filesystem::path& path) {
+  constexpr int kMostLinks = 40;  // as the system itself follows
+  std::filesystem::path current = path;
+  for (int links = 0; std::filesystem::is_symlink(std::filesystem::symlink_status(current)); ++links) {
+    if (links == kMostLinks) throw std::system_error(ELOOP, std::generic_category(), "following its links");
+    const std::filesystem::path next = std::filesystem::read_symlink(current);
+    current = next.is_absolute() ? next : current.parent_path() / next;
+  }
+  return current;
+}
+
 }  // namespace
 
 void SaveDrawingFile(const Drawing& drawing, const std::filesystem::path& path) {
@@ -154,7 +167,7 @@ void SaveDrawingFile(const Drawing& drawing, const std::filesystem::path& path) 
     Refuse(Reason::CannotWrite, path, "the drawing does not hold together: " + *problem);
   }
   try {
-    drawing_file::FileReplacement replacement(path);
+    drawing_file::FileReplacement replacement(FileBehindLinks(path));
     drawing_file::WriteDrawingDatabase(drawing, replacement.TemporaryPath());
     replacement.Commit();
   } catch (const std::runtime_error& error) {  // system, SQLite and content errors alike

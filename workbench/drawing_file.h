@@ -30,7 +30,8 @@ class DrawingFileError : public std::runtime_error {
 };
 
 // Replaces the file atomically: after a crash at any moment the path holds either the previous
-// drawing or this one, and the previous version stays beside it as "<name>.bak". Refuses
+// drawing or this one, and the previous version stays beside it as "<name>.bak". A path that is
+// a symbolic link saves to the file the link leads to (its backup beside that file). Refuses
 // (CannotWrite) a drawing that OpenDrawingFile would refuse, so every saved file opens again.
 void SaveDrawingFile(const Drawing& drawing, const std::filesystem::path& path);
 

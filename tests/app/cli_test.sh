@@ -55,6 +55,11 @@ check add-camera-not-a-number 1 '^pandex: the eye and the target must be numbers
 check add-camera-no-target 106 'target is required' -- "$pandex" add-camera "$work/views.pdx" N --eye 1 2 3
 check build-2d-bad-mode 105 'bogus not in' -- "$pandex" build-2d --mode bogus
 check build-2d-missing 1 '^pandex: .+none\.pdx' -- "$pandex" build-2d "$work/none.pdx"
+# Editing through a link changes the drawing it leads to and leaves the link.
+mkdir "$work/real" && "$pandex" sample "$work/real/linked.pdx" >/dev/null && ln -s real/linked.pdx "$work/link.pdx"
+"$pandex" add-camera "$work/link.pdx" Linked --eye 1 2 3 --target 0 0 0 >/dev/null
+check edit-through-link 0 '\[x\] Linked ' -- "$pandex" info "$work/real/linked.pdx"
+check link-kept 0 '^link$' -- bash -c "[ -L '$work/link.pdx' ] && echo link"
 # Two editors at once: each waits for the other, and both cameras are kept.
 "$pandex" sample "$work/busy.pdx" >/dev/null
 for pair in 1 2 3 4 5 6 7 8; do

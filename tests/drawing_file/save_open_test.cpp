@@ -116,6 +116,30 @@ TEST(DrawingFileSaveOpen, LeftoversOfKilledSavesAreClearedButNotThoseOfRunningOn
   EXPECT_EQ(folder.Names(), (Names{leftovers[0], leftovers[3], "plan.pdx", "plan.pdx.bak"}));
 }
 
+TEST(DrawingFileSaveOpen, SavingThroughLinksChangesTheDrawingTheyLeadToAndKeepsTheLinks) {
+  drawing_file_samples::ScratchFolder folder;
+  std::filesystem::create_directory(folder / "real");
+  wb::SaveDrawingFile(MakeBulkDrawing(10, 1), folder / "real" / "plan.pdx");
+  // A relative link in another folder, and a link to that link.
+  std::filesystem::create_directory(folder / "links");
+  std::filesystem::create_symlink("../real/plan.pdx", folder / "links" / "plan.pdx");
+  std::filesystem::create_symlink(folder / "links" / "plan.pdx", folder / "shortcut.pdx");
+  const wb::Drawing changed = MakeBulkDrawing(30, 2);
+  wb::SaveDrawingFile(changed, folder / "shortcut.pdx");
+  EXPECT_TRUE(std::filesystem::is_symlink(folder / "shortcut.pdx"));
+  EXPECT_TRUE(std::filesystem::is_symlink(folder / "links" / "plan.pdx"));
+  EXPECT_EQ(wb::OpenDrawingFile(folder / "real" / "plan.pdx"), changed);
+  EXPECT_EQ(wb::OpenDrawingFile(folder / "real" / "plan.pdx.bak"), MakeBulkDrawing(10, 1));
+  EXPECT_EQ(folder.Names(), (Names{"links", "real", "shortcut.pdx"}));
+  // A link to a drawing not saved yet makes it; a loop of links is refused.
+  std::filesystem::create_symlink("real/new.pdx", folder / "ahead.pdx");
+  wb::SaveDrawingFile(changed, folder / "ahead.pdx");
+  EXPECT_EQ(wb::OpenDrawingFile(folder / "real" / "new.pdx"), changed);
+  std::filesystem::create_symlink("loop.pdx", folder / "loop.pdx");
+  EXPECT_THROW(wb::SaveDrawingFile(changed, folder / "loop.pdx"), wb::DrawingFileError);
+  EXPECT_TRUE(std::filesystem::is_symlink(folder / "loop.pdx"));
+}
+
 TEST(DrawingFileSaveOpen, PlacesThatCannotTakeAFileAreLeftAsTheyWere) {
   drawing_file_samples::ScratchFolder folder;
   std::filesystem::create_directory(folder / "taken.pdx");
