@@ -9,6 +9,7 @@
 #include <cerrno>
 #include <cstdio>
 #include <map>
+#include <optional>
 #include <random>
 #include <sstream>
 #include <string>
@@ -116,11 +117,15 @@ std::string Serialize(const SheetWriter& writer, const Sheet& sheet, const std::
   return std::move(out).str();
 }
 
-Sheet SheetToWrite(const Sheet& sheet, const std::filesystem::path& dxfPath, bool overwrite) {
+Sheet SheetToWrite(const Sheet& sheet, const std::filesystem::path& dxfPath, bool overwrite,
+                   std::optional<Sheet>* before) {
   std::error_code error;
   if (overwrite || !std::filesystem::exists(std::filesystem::symlink_status(dxfPath, error))) return sheet;
   try {
-    return MergeSheets(ReadDxfSheet(dxfPath), sheet);
+    Sheet existing = ReadDxfSheet(dxfPath);
+    Sheet merged = MergeSheets(existing, sheet);
+    if (before != nullptr) *before = std::move(existing);
+    return merged;
   } catch (const DxfReadError& problem) {
     throw SheetFileError(std::string("cannot merge into ") + problem.what());
   }
@@ -188,7 +193,9 @@ Sheet MergeSheets(const Sheet& existing, const Sheet& added) {
   return merged;
 }
 
-void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bool overwrite) {
+void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bool overwrite,
+                     std::optional<Sheet>* before) {
+  if (before != nullptr) before->reset();
   const std::filesystem::path dxfPath = DxfPathOf(target);
   const std::filesystem::path svgPath = SvgPathOf(target);
   try {
@@ -196,7 +203,7 @@ void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bo
   } catch (const std::system_error& error) {
     throw SheetFileError(error.what());
   }
-  const Sheet content = SheetToWrite(sheet, dxfPath, overwrite);
+  const Sheet content = SheetToWrite(sheet, dxfPath, overwrite, before);
   const std::string dxf = Serialize(DxfWriter(), content, dxfPath);
   const std::string svg = Serialize(SvgWriter(), content, svgPath);
   RefuseFolderAt(dxfPath);

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <filesystem>
+#include <optional>
 #include <stdexcept>
 
 #include "workbench/draft/sheet.h"
@@ -31,6 +32,8 @@ Sheet MergeSheets(const Sheet& existing, const Sheet& added);
 // so the target holds the old drawing or the new one, never part of one. Throws SheetFileError
 // (the target in use by another user, a folder missing or not writable, an old file that cannot
 // be merged into, a value no file can carry), leaving the old files and no temporary behind.
-void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bool overwrite);
+// When the sheet was merged into an old drawing and `before` is given, it receives that drawing.
+void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bool overwrite,
+                     std::optional<Sheet>* before = nullptr);
 
 }  // namespace wb::draft
