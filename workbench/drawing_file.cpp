@@ -21,7 +21,7 @@
 #include "workbench/drawing_file_check.h"
 #include "workbench/drawing_file_database.h"
 #include "workbench/drawing_file_format.h"
-#include "workbench/drawing_file_replace.h"
+#include "workbench/file_replacement.h"
 
 namespace wb {
 namespace {
@@ -167,7 +167,7 @@ void SaveDrawingFile(const Drawing& drawing, const std::filesystem::path& path) 
     Refuse(Reason::CannotWrite, path, "the drawing does not hold together: " + *problem);
   }
   try {
-    drawing_file::FileReplacement replacement(FileBehindLinks(path));
+    FileReplacement replacement(FileBehindLinks(path), {".saving", true});
     drawing_file::WriteDrawingDatabase(drawing, replacement.TemporaryPath());
     replacement.Commit();
   } catch (const std::runtime_error& error) {  // system, SQLite and content errors alike

@@ -116,6 +116,27 @@ TEST(DrawingFileSaveOpen, LeftoversOfKilledSavesAreClearedButNotThoseOfRunningOn
   EXPECT_EQ(folder.Names(), (Names{leftovers[0], leftovers[3], "plan.pdx", "plan.pdx.bak"}));
 }
 
+TEST(DrawingFileSaveOpen, NamesUpToTheLongestTheFileSystemTakesSaveWithTheirBackups) {
+  drawing_file_samples::ScratchFolder folder;
+  const std::string twoBytes = "\xC3\xA9";  // e acute
+  for (const std::size_t length : {231U, 243U, 255U}) {
+    SCOPED_TRACE(length);
+    std::string name;
+    while (name.size() + twoBytes.size() + 4 <= length) name += twoBytes;
+    name = std::string(length - 4 - name.size(), 'p') + name + ".pdx";
+    ASSERT_EQ(name.size(), length);
+    wb::SaveDrawingFile(MakeBulkDrawing(10, 1), folder / name);
+    wb::SaveDrawingFile(MakeBulkDrawing(20, 2), folder / name);
+    EXPECT_EQ(wb::OpenDrawingFile(folder / name), MakeBulkDrawing(20, 2));
+    // The backup keeps as much of the name as fits, in whole characters.
+    std::string backup = name.substr(0, std::min<std::size_t>(name.size(), 251));
+    if ((static_cast<unsigned char>(backup.back()) & 0xC0) == 0xC0) backup.pop_back();
+    EXPECT_EQ(wb::OpenDrawingFile(folder / (backup + ".bak")), MakeBulkDrawing(10, 1));
+    EXPECT_EQ(folder.Names().size(), 2U);
+    for (const std::string& left : folder.Names()) std::filesystem::remove(folder / left);
+  }
+}
+
 TEST(DrawingFileSaveOpen, SavingThroughLinksChangesTheDrawingTheyLeadToAndKeepsTheLinks) {
   drawing_file_samples::ScratchFolder folder;
   std::filesystem::create_directory(folder / "real");
