@@ -10,7 +10,7 @@ namespace app {
 
 struct Build2DOptions {
   std::string drawing;    // empty: the built-in sample
-  std::string outputDir;  // where the sample counts as saved (its 2D_ folder goes there)
+  std::string outputDir;  // receives the 2D_ folder in place of the drawing's folder; empty: no such folder
   HRUtility::BuildMode mode = HRUtility::BuildMode::All;
   bool progressBar = false;  // redraw one line on a terminal instead of a line per view
 };
