@@ -11,6 +11,7 @@
 #include "shell/host/argument_blocks.h"
 #include "views/hr_camera_mgr.h"
 #include "views/view_collection.h"
+#include "workbench/draft/sheet_files.h"
 #include "workbench/workbench.h"
 
 namespace app {
@@ -74,6 +75,9 @@ int RunBuild2D(const Build2DOptions& options, std::ostream& out, std::ostream& e
   SetDatabase(db.handle);
   HRUtility::Build2DBatch batch(options.mode, CollectSectionHandles(db.handle), CollectPlanHandles(db.handle));
   if (!outputParent.empty()) batch.SetOutputParent(outputParent.string());
+  batch.AllowOwnFilesAnywhere(options.ownFilesAnywhere);
+  // What writes killed in an earlier run left behind goes before this run writes anything.
+  wb::draft::RemoveStaleSheetTemporaries((outputParent.empty() ? drawingPath.parent_path() : outputParent) / "2D_");
   batch.OnProgress([&](const HRUtility::BuildProgress& progress) { ShowProgress(progress, options.progressBar, out); });
   const HRUtility::BuildResult result = batch.Run();
   if (options.progressBar && !result.steps.empty()) out << '\n';
@@ -85,7 +89,8 @@ int RunBuild2D(const Build2DOptions& options, std::ostream& out, std::ostream& e
   }
   out << result.Saved() << " of " << result.total << " views saved to " << result.folder << '\n';
   for (const HRUtility::BuildStep& step : result.steps) {
-    out << "  " << step.view << ": " << step.file << ".dxf, .svg (" << OutcomeText(step.outcome) << ")\n";
+    out << "  " << step.view << ": " << step.file << ".dxf, .svg (" << OutcomeText(step.outcome)
+        << (step.reason.empty() ? "" : ": " + step.reason) << ")\n";
     for (const std::string& warning : step.warnings) errors << "pandex: warning: " << step.view << ": " << warning << '\n';
   }
   return result.AllSaved() ? 0 : 1;

@@ -48,6 +48,8 @@ int main(int argc, char** argv) {
                       "The folder that receives the 2D_ folder (default: the drawing's folder; for the built-in "
                       "sample, the current folder). Only its last part is made when missing")
       ->check(kNamed);
+  build2d->add_flag("--allow-outside-2d-folder", build.ownFilesAnywhere,
+                    "Let cameras' own 2D file names lead out of the drawing's folder or hold control characters");
 
   std::string infoPath;
   CLI::App* info = app.add_subcommand(

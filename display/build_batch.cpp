@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <cstring>
 #include <filesystem>
+#include <optional>
 #include <system_error>
 
 #include "display/save2d.h"
@@ -80,9 +81,18 @@ std::int32_t Build2DBatch::Count() const {
 
 void Build2DBatch::Generate(const HRCamera& camera, std::string view, std::string file, bool plan,
                             BuildResult& result) {
-  if (!camera.Get2DFile().empty()) file = camera.Get2DFile();
   BuildStep& step = result.steps.emplace_back();
   step.view = std::move(view);
+  if (!camera.Get2DFile().empty()) {
+    std::optional<std::string> own = OwnOutputFile(camera.Get2DFile(), drawingFolder_, ownFilesAnywhere_, step.reason);
+    if (!own) {
+      step.file = camera.Get2DFile();
+      step.outcome = BuildStep::Outcome::Failed;
+      Report(step);
+      return;
+    }
+    file = std::move(*own);
+  }
   OutputFileClaims::Claim claim = claims_.Take(step.view, file, camera.GetOverwrite2D() == 0);
   step.file = std::move(claim.file);
   if (!claim.warning.empty()) step.warnings.push_back(std::move(claim.warning));
@@ -99,12 +109,17 @@ void Build2DBatch::Generate(const HRCamera& camera, std::string view, std::strin
              camera.GetPreserveWalls(), camera.GetPreserveLayer(), camera.GetPreserveLayerIndex());
   step.outcome = saved ? BuildStep::Outcome::Saved : BuildStep::Outcome::Failed;
   if (saved) ++position_;
-  if (progress_) {
-    const std::string status = std::string(resources::LoadString(resources::kIdsFile)) + " " +
-                               std::to_string(position_) + " " + std::string(resources::LoadString(resources::kIdsOf)) +
-                               " " + std::to_string(upper_);
-    progress_({position_, upper_, status, &step});
-  }
+  Report(step);
+}
+
+// The progress step after a save or a refusal: the bar moves on success only, the status line
+// always.
+void Build2DBatch::Report(const BuildStep& step) {
+  if (!progress_) return;
+  const std::string status = std::string(resources::LoadString(resources::kIdsFile)) + " " +
+                             std::to_string(position_) + " " + std::string(resources::LoadString(resources::kIdsOf)) +
+                             " " + std::to_string(upper_);
+  progress_({position_, upper_, status, &step});
 }
 
 void Build2DBatch::CameraPass(const OutputNames& names, BuildResult& result) {
@@ -143,6 +158,7 @@ BuildResult Build2DBatch::Run() {
     return result;
   }
   OutputNames names = OutputNamesFor(drawing);
+  drawingFolder_ = std::filesystem::path(drawing).parent_path().string();
   if (!outputParent_.empty()) names.folder = (std::filesystem::path(outputParent_) / "2D_").string();
   result.folder = names.folder;
   claims_ = OutputFileClaims();

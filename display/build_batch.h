@@ -22,6 +22,7 @@ struct BuildStep {
   std::string view;  // camera name, or section or plan name and camera name
   std::string file;  // output name without extension
   Outcome outcome = Outcome::Saved;
+  std::string reason;                 // why a failed view was not saved, when known
   std::vector<std::string> warnings;  // what the user should know although the view was handled
 };
 
@@ -49,6 +50,8 @@ class Build2DBatch {
   void OnProgress(std::function<void(const BuildProgress&)> callback) { progress_ = std::move(callback); }
   // The folder that receives the 2D folder, in place of the drawing's own folder.
   void SetOutputParent(std::string folder) { outputParent_ = std::move(folder); }
+  // Lets cameras' own 2D file names lead anywhere (see OwnOutputFile).
+  void AllowOwnFilesAnywhere(bool allow) { ownFilesAnywhere_ = allow; }
   // Views ticked for 2D in this mode.
   std::int32_t Count() const;
   BuildResult Run();
@@ -67,7 +70,11 @@ class Build2DBatch {
   std::vector<host::EntityHandle> sections_;
   std::vector<host::EntityHandle> plans_;
   std::function<void(const BuildProgress&)> progress_;
+  void Report(const BuildStep& step);
+
   std::string outputParent_;
+  bool ownFilesAnywhere_ = false;
+  std::string drawingFolder_;
   OutputFileClaims claims_;
   std::int32_t position_ = 0;
   std::int32_t upper_ = 0;

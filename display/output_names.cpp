@@ -2,6 +2,7 @@
 // collisions within one run told apart.
 #include "display/output_names.h"
 
+#include <algorithm>
 #include <cstring>
 #include <filesystem>
 #include <system_error>
@@ -70,6 +71,28 @@ std::string DefaultOutputFile(const OutputNames& names, const std::string& viewN
   // "." and ".." alone would name a folder; a prefix normally prevents it, an empty one not.
   if (file.empty() || file == "." || file == "..") file = "_" + file;
   return (std::filesystem::path(names.folder) / file).string();
+}
+
+std::optional<std::string> OwnOutputFile(const std::string& own, const std::string& drawingFolder, bool allowAnywhere,
+                                         std::string& refusal) {
+  const std::filesystem::path folder = std::filesystem::absolute(drawingFolder).lexically_normal();
+  const std::filesystem::path file = (folder / own).lexically_normal();  // an absolute name stays as it is
+  if (allowAnywhere) return file.string();
+  if (std::ranges::any_of(own, [](char c) { return static_cast<unsigned char>(c) < 0x20 || c == 0x7F; })) {
+    refusal = "its own 2D file name holds control characters";
+    return std::nullopt;
+  }
+  // Links to folders may lead anywhere; what counts is the folder the file ends up in. A link
+  // in the file's own place is replaced, not followed.
+  std::error_code error;
+  const std::filesystem::path realFolder = std::filesystem::weakly_canonical(folder, error);
+  const std::filesystem::path realFile = std::filesystem::weakly_canonical(file.parent_path(), error) / file.filename();
+  const std::filesystem::path inside = realFile.lexically_relative(realFolder);
+  if (error || inside.empty() || *inside.begin() == ".." || inside == ".") {
+    refusal = "its own 2D file " + file.string() + " lies outside the drawing's folder " + folder.string();
+    return std::nullopt;
+  }
+  return file.string();
 }
 
 OutputFileClaims::Claim OutputFileClaims::Take(const std::string& view, const std::string& file, bool adds) {

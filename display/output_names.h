@@ -3,6 +3,7 @@
 #pragma once
 
 #include <map>
+#include <optional>
 #include <string>
 
 namespace HRUtility {
@@ -19,6 +20,12 @@ OutputNames OutputNamesFor(const std::string& drawingPath);
 // hold. Characters no file system takes become '_'. The name is written whole where the
 // folder's file system takes it, and cut between characters only where it is too long.
 std::string DefaultOutputFile(const OutputNames& names, const std::string& viewName);
+
+// Where a camera's own 2D file name leads: a relative name is taken from the drawing's folder.
+// Unless allowed, a name that leads out of the drawing's folder (symbolic links followed) or
+// holds control characters is refused: nothing is answered, and `refusal` says why.
+std::optional<std::string> OwnOutputFile(const std::string& own, const std::string& drawingFolder, bool allowAnywhere,
+                                         std::string& refusal);
 
 // Views whose files would share one name (the same name, or names equal without regard to case,
 // as some file systems compare them) get told apart by this and a number, "~2", "~3", ...

@@ -65,6 +65,10 @@ check build-2d-output-dir-files 0 '^3$' -- count_dxf "$work/elsewhere/2D_"
 check build-2d-no-deep-tree 1 '^pandex: the output folder .*/not/there cannot be made: .*/not does not exist$' -- \
   "$pandex" build-2d --output-dir "$work/not/there"
 check build-2d-no-deep-tree-made 0 '^absent$' -- absent "$work/not"
+# A new run sweeps away what killed writes of earlier runs left in the 2D folder.
+: >"$work/2D_/.views_North.dxf.0123456789abcdef.tmp"
+"$pandex" build-2d "$work/views.pdx" --mode plans >/dev/null
+check build-2d-sweeps-leftovers 0 '^absent$' -- absent "$work/2D_/.views_North.dxf.0123456789abcdef.tmp"
 # Views whose files would collide are written apart, with a warning.
 "$pandex" add-camera "$work/views.pdx" "a/b" --eye 5 30 5 --target 5 4 2 >/dev/null
 "$pandex" add-camera "$work/views.pdx" "a_b" --eye 5 -30 5 --target 5 4 2 >/dev/null

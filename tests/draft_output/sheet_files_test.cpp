@@ -15,7 +15,6 @@
 #include "tests/drawing_file/scratch_folder.h"
 #include "workbench/draft/dxf_reader.h"
 #include "workbench/draft/file_lock.h"
-#include "workbench/file_replacement.h"
 
 namespace {
 
@@ -115,7 +114,7 @@ TEST_F(SheetFiles, LeftoversOfKilledWritesAreSweptButNotThoseOfRunningOnes) {
   WriteSheetFiles(second_, target_, true);
   EXPECT_EQ(folder_.Names(), (std::vector<std::string>{leftovers[3], leftovers[2], leftovers[1], "keep.tmp",
                                                        "plan.dxf", "plan.svg"}));
-  wb::RemoveStaleTemporaries(folder_.Path(), ".tmp");
+  RemoveStaleSheetTemporaries(folder_.Path());
   EXPECT_EQ(folder_.Names(),
             (std::vector<std::string>{leftovers[3], leftovers[2], "keep.tmp", "plan.dxf", "plan.svg"}));
   close(running);

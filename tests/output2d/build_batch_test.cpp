@@ -116,6 +116,38 @@ TEST_F(BuildBatchTest, CameraWithItsOwnFileNameIsSavedThereNotInTheFolder) {
   EXPECT_EQ(Names(OutputFolder()), (Strings{"house_Plain.dxf", "house_Plain.svg"}));
 }
 
+TEST_F(BuildBatchTest, OwnFileNamesAreTakenFromTheDrawingsFolderAndMayNotLeaveIt) {
+  AddCube();
+  const std::filesystem::path job = Folder() / "job";
+  std::filesystem::create_directories(job / "sub");
+  std::filesystem::create_directory(Folder() / "outside");
+  std::filesystem::create_directory_symlink(Folder() / "outside", job / "link");
+  Bench().SetDrawingPath(Bench().Current(), (job / "house.pdx").string());
+  const Strings own = {"sub/front", "../outside/escaped", (Folder() / "outside" / "absolute").string(),
+                       "link/through", "bell\a", (job / "sub" / "absolute").string()};
+  for (std::size_t i = 0; i < own.size(); ++i) AddCamera("C" + std::to_string(i), kFront, true, own[i]);
+
+  const BuildResult refused = Run(BuildMode::Cameras);
+  EXPECT_EQ(Each(refused, &BuildStep::outcome), (std::vector{Outcome::Saved, Outcome::Failed, Outcome::Failed,
+                                                             Outcome::Failed, Outcome::Failed, Outcome::Saved}));
+  EXPECT_EQ(refused.steps[0].file, (job / "sub" / "front").string()) << "from the drawing's folder, not the process's";
+  EXPECT_EQ(refused.steps[1].reason, "its own 2D file " + (Folder() / "outside" / "escaped").string() +
+                                         " lies outside the drawing's folder " + job.string());
+  EXPECT_EQ(refused.steps[4].reason, "its own 2D file name holds control characters");
+  EXPECT_TRUE(std::filesystem::is_empty(Folder() / "outside")) << "nothing written where a refused name leads";
+  EXPECT_EQ(reports_.size(), own.size()) << "a refused view still reports its step";
+
+  HRUtility::Build2DBatch anywhere(BuildMode::Cameras, {}, {});
+  anywhere.AllowOwnFilesAnywhere(true);
+  EXPECT_TRUE(anywhere.Run().AllSaved());
+  EXPECT_TRUE(std::filesystem::exists(Folder() / "outside" / "escaped.dxf"));
+  EXPECT_TRUE(std::filesystem::exists(job / "link" / "through.dxf"));
+  // The camera keeps its name as the user gave it.
+  HRCamera camera;
+  ASSERT_EQ(LoadGeneralCamera(camera, 1), 0);
+  EXPECT_EQ(camera.Get2DFile(), "../outside/escaped");
+}
+
 TEST_F(BuildBatchTest, HostileViewNamesStayInsideTheFolderAsValidFileNames) {
   AddCube();
   std::string accents;

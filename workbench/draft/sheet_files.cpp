@@ -31,10 +31,12 @@ void RefuseFolderAt(const std::filesystem::path& path) {
   if (std::filesystem::is_directory(std::filesystem::symlink_status(path, ignored))) Fail(path, "replace", EISDIR);
 }
 
+constexpr ReplacementStyle kSheetReplacement{".tmp", false};
+
 // The new version of one file, complete and synced under its temporary name.
 std::unique_ptr<FileReplacement> Prepared(const std::filesystem::path& path, std::string_view content) {
   try {
-    auto file = std::make_unique<FileReplacement>(path, ReplacementStyle{".tmp", false});
+    auto file = std::make_unique<FileReplacement>(path, kSheetReplacement);
     file->Write(content);
     return file;
   } catch (const std::system_error& error) {
@@ -75,6 +77,10 @@ Sheet SheetToWrite(const Sheet& sheet, const std::filesystem::path& dxfPath, boo
 }
 
 }  // namespace
+
+void RemoveStaleSheetTemporaries(const std::filesystem::path& folder) {
+  RemoveStaleTemporaries(folder, kSheetReplacement.suffix);
+}
 
 std::filesystem::path DxfPathOf(const std::filesystem::path& target) {
   std::filesystem::path path = target;

@@ -16,6 +16,10 @@ class SheetFileError : public std::runtime_error {
   using std::runtime_error::runtime_error;
 };
 
+// Removes what writes of 2D files that were killed left in the folder: temporaries that no
+// running write holds. Best effort.
+void RemoveStaleSheetTemporaries(const std::filesystem::path& folder);
+
 std::filesystem::path DxfPathOf(const std::filesystem::path& target);
 std::filesystem::path SvgPathOf(const std::filesystem::path& target);
 
