@@ -9,7 +9,7 @@
 #include <filesystem>
 #include <fstream>
 #include <functional>
-#include <iostream>
+#include <ostream>
 #include <string>
 #include <vector>
 
@@ -321,7 +321,10 @@ void Templates(Gallery& gallery) {
   }
 }
 
-int RunGallery(const std::string& folder) {
+}  // namespace
+
+int RunUiGallery(const CLI::App& command, std::ostream& out) {
+  const std::string folder = command.get_option("DIR")->as<std::string>();
   fs::create_directories(folder);
   framework::SetResourceModule(&resources::Module());
   Gallery gallery(folder);
@@ -339,26 +342,16 @@ int RunGallery(const std::string& folder) {
   }
   gallery.WriteIndex();
   framework::SetResourceModule(nullptr);
-  for (const std::string& name : gallery.Names()) std::cout << (fs::path(folder) / (name + ".svg")).string() << '\n';
-  std::cout << "Open " << (fs::path(folder) / "index.html").string() << " in a browser, or make a PNG of one picture with\n"
-            << "  rsvg-convert -z 2 " << (fs::path(folder) / "dialog_5012.svg").string() << " -o dialog_5012.png\n";
+  for (const std::string& name : gallery.Names()) out << (fs::path(folder) / (name + ".svg")).string() << '\n';
+  out << "Open " << (fs::path(folder) / "index.html").string() << " in a browser, or make a PNG of one picture with\n"
+      << "  rsvg-convert -z 2 " << (fs::path(folder) / "dialog_5012.svg").string() << " -o dialog_5012.png\n";
   return 0;
 }
 
-}  // namespace
-
-void AddUiGalleryCommand(CLI::App& app) {
-  auto folder = std::make_shared<std::string>();
+CLI::App* AddUiGalleryCommand(CLI::App& app) {
   CLI::App* command = app.add_subcommand("ui-gallery", "Draw every control and every dialog (empty) as SVG pictures into a folder");
-  command->add_option("DIR", *folder, "Folder for the pictures and their index page")->required();
-  command->callback([folder] {
-    try {
-      RunGallery(*folder);
-    } catch (const std::exception& error) {
-      std::cerr << "pandex: " << error.what() << '\n';
-      throw CLI::RuntimeError(1);
-    }
-  });
+  command->add_option("DIR", "Folder for the pictures and their index page")->required();
+  return command;
 }
 
 }  // namespace app

@@ -2,13 +2,17 @@
 // look at.
 #pragma once
 
+#include <ostream>
+
 namespace CLI {
 class App;
 }
 
 namespace app {
 
-// Adds "ui-gallery DIR" to the command line; it runs as soon as it is parsed.
-void AddUiGalleryCommand(CLI::App& app);
+// Adds "ui-gallery DIR" to the command line and answers its subcommand.
+CLI::App* AddUiGalleryCommand(CLI::App& app);
+// Writes the pictures into DIR and lists them on `out`; throws when the folder cannot be written.
+int RunUiGallery(const CLI::App& command, std::ostream& out);
 
 }  // namespace app
