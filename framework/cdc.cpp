@@ -11,17 +11,6 @@
 
 namespace {
 
-// Without DT_NOPREFIX an ampersand marks the next character (the key that chooses a control)
-// and is not shown; two ampersands show one.
-std::string WithoutPrefixes(std::string_view text) {
-  std::string out;
-  for (std::size_t i = 0; i < text.size(); ++i) {
-    if (text[i] == '&' && i + 1 < text.size()) ++i;
-    out += text[i];
-  }
-  return out;
-}
-
 // Breaks a text into lines no wider than `width` at blanks (and at line breaks); a word wider
 // than the line stands on a line of its own.
 std::vector<std::string> WrapLines(const std::string& text, int width, bool bold) {
@@ -89,7 +78,7 @@ CSize CDC::GetTextExtent(std::string_view text) const {
 int CDC::DrawText(std::string_view rawText, RECT* rect, UINT format) {
   if (rect == nullptr) return 0;
   const bool bold = font_ != nullptr && font_->IsBold();
-  const std::string text = (format & DT_NOPREFIX) != 0 ? std::string(rawText) : WithoutPrefixes(rawText);
+  const std::string text = (format & DT_NOPREFIX) != 0 ? std::string(rawText) : framework::WithoutMnemonics(rawText);
   const CRect box(*rect);
   std::vector<std::string> lines;
   if ((format & DT_SINGLELINE) != 0) {

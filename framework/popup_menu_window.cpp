@@ -43,15 +43,6 @@ char Mnemonic(const MenuItem& item) {
   return static_cast<char>(std::toupper(static_cast<unsigned char>(item.text[at + 1])));
 }
 
-std::string Visible(const std::string& text) {
-  std::string out;
-  for (std::size_t i = 0; i < text.size(); ++i) {
-    if (text[i] == '&' && i + 1 < text.size()) ++i;
-    out += text[i];
-  }
-  return out;
-}
-
 const std::vector<MenuItem>& ItemsOf(HMENU menu) {
   static const std::vector<MenuItem> none;
   const std::vector<MenuItem>* items = detail::MenuItems(menu);
@@ -71,7 +62,7 @@ SIZE MenuSize(HMENU menu) {
   int height = 0;
   for (const MenuItem& item : ItemsOf(menu)) {
     height += IsSeparator(item) ? kSeparatorHeight : kItemHeight;
-    width = std::max(width, kImageColumn + 4 + TextWidth(Visible(item.text)) + kTextRightPadding);
+    width = std::max(width, kImageColumn + 4 + TextWidth(WithoutMnemonics(item.text)) + kTextRightPadding);
   }
   return {width, height};
 }
@@ -142,7 +133,7 @@ class PopupMenuBehaviour : public ControlBehaviour {
       if (static_cast<int>(i) == hot_) add("highlighted");
       if ((item.flags & MF_CHECKED) != 0) add("checked");
       if (!IsEnabled(item)) add("disabled");
-      Canvas::Attributes attributes = {{"data-item", Visible(item.text)}, {"data-command", std::to_string(item.id)}};
+      Canvas::Attributes attributes = {{"data-item", WithoutMnemonics(item.text)}, {"data-command", std::to_string(item.id)}};
       if (!state.empty()) attributes.emplace_back("data-state", state);
       canvas.BeginGroup(attributes);
       if (static_cast<int>(i) == hot_) {

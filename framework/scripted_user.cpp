@@ -10,6 +10,7 @@
 #include "framework/geometry.h"
 #include "framework/input.h"
 #include "framework/menu.h"
+#include "framework/text_metrics.h"
 #include "framework/window_classes.h"
 #include "framework/window_system.h"
 
@@ -18,14 +19,6 @@ namespace {
 
 constexpr DWORD kLabelEditWait = 600;  // longer than the tree waits before it opens its editor
 
-std::string VisibleText(std::string_view text) {
-  std::string out;
-  for (std::size_t i = 0; i < text.size(); ++i) {
-    if (text[i] == '&' && i + 1 < text.size()) ++i;
-    out += text[i];
-  }
-  return out;
-}
 
 HWND Search(HWND within, const std::function<bool(HWND)>& match) {
   for (HWND child : GetChildren(within)) {
@@ -78,8 +71,6 @@ std::string ItemText(HWND tree, HTREEITEM item) {
   ::SendMessage(tree, TVM_GETITEM, 0, reinterpret_cast<LPARAM>(&t));
   return buffer;
 }
-
-std::string WithoutMnemonics(std::string_view text) { return VisibleText(text); }
 
 HWND ChildOfClass(HWND parent, std::string_view className) {
   for (HWND child : GetChildren(parent)) {
@@ -139,7 +130,7 @@ HWND ScriptedUser::Find(int id, HWND within) const {
 HWND ScriptedUser::FindByText(std::string_view text, HWND within) const {
   const HWND root = within ? within : ActiveWindow();
   const HWND found = Search(root, [text](HWND h) {
-    return ::IsWindowVisible(h) && VisibleText(::GetWindowText(h)) == VisibleText(text);
+    return ::IsWindowVisible(h) && WithoutMnemonics(::GetWindowText(h)) == WithoutMnemonics(text);
   });
   if (!found) throw ScriptError("no control showing \"" + std::string(text) + "\" in the window");
   return found;

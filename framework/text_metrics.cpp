@@ -28,4 +28,13 @@ int TextWidth(std::string_view text, bool bold) {
   return static_cast<int>(std::lround(static_cast<double>(total) * kFontSize * scale / 2048.0));
 }
 
+std::string WithoutMnemonics(std::string_view text) {
+  std::string out;
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    if (text[i] == '&' && i + 1 < text.size()) ++i;
+    out += text[i];
+  }
+  return out;
+}
+
 }  // namespace framework

@@ -2,6 +2,7 @@
 // sans-serif face the pictures name first, so that centring and hit tests match the picture.
 #pragma once
 
+#include <string>
 #include <string_view>
 
 namespace framework {
@@ -13,5 +14,9 @@ inline constexpr int kFontAscent = 10;   // pixels from a line's top to its base
 
 // Width in pixels of a text in the window font (bytes of the 8-bit code page).
 int TextWidth(std::string_view text, bool bold = false);
+
+// A text as it shows on a control or a menu: an ampersand marks the next character (the key
+// that chooses it) and is not shown; two ampersands show one.
+std::string WithoutMnemonics(std::string_view text);
 
 }  // namespace framework
