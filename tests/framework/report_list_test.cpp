@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "framework/controls/button.h"
+#include "framework/image_list.h"
 #include "framework/render.h"
 #include "framework/window_classes.h"
 #include "tests/framework/framework_fixture.h"
@@ -237,6 +238,51 @@ TEST_F(ReportListTest, TabAndTheArrowKeysCarryTheEditorToTheNextCell) {
   EXPECT_EQ(Column(1), (Texts{"Outer walls", "Slabs", "Roof"}));
   EXPECT_EQ(parent.heard, (std::vector<Heard>{{WM_REPORT_CELL_EDITED, 0, 1}, {WM_REPORT_CELL_EDITED, 0, 0},
                                               {WM_REPORT_CELL_EDITED, 0, 0}}));
+}
+
+TEST_F(ReportListTest, TheEditorCoversTheCellsLabelWithTheColumnsAlignment) {
+  CImageList images;
+  images.Create(5052U, 15, 1, RGB(255, 0, 255));
+  list.SetImageList(&images);
+  list.InsertColumn(0, "ID", LVCFMT_LEFT, 40);
+  list.InsertColumn(1, "Name", LVCFMT_RIGHT, 130);
+  list.InsertColumn(2, "On/Off", LVCFMT_LEFT, 60);
+  list.InsertItem(0, "1");
+  list.SetItemText(0, 1, "Walls");
+  list.SetItemText(0, 2, "on");
+  list.SetItemImage(0, 2, 2);
+
+  user.ClickListCell(list.m_hWnd, 0, 0);
+  EXPECT_THROW(user.EditListCell(list.m_hWnd, 0, 1, "Floors"), framework::ScriptError);  // not editable yet
+  list.SetEditable();
+  user.ClickListCell(list.m_hWnd, 0, 1);
+  CEdit* editor = list.GetEditControl();
+  EXPECT_NE(editor->GetStyle() & ES_RIGHT, 0U);  // the right-aligned column's editor
+  EXPECT_EQ(editor->GetWindowText(), "Walls");
+  user.Press(VK_TAB);
+  EXPECT_EQ(editor->GetStyle() & ES_RIGHT, 0U);  // made anew for the next column
+  EXPECT_EQ(editor->GetWindowText(), "on");
+  RECT cell;
+  list.GetSubItemRect(0, 2, LVIR_LABEL, &cell);
+  RECT placed;
+  editor->GetWindowRect(&placed);
+  list.ScreenToClient(reinterpret_cast<POINT*>(&placed));
+  EXPECT_EQ(placed.left, cell.left + 16);  // clear of the cell's image
+}
+
+TEST_F(ReportListTest, NewColumnsGiveEveryRowTheSystemColoursThere) {
+  Fill({"ID", "Name"}, {{"1", "Walls"}, {"2", "Slabs"}});
+  list.SetItemTextColor(0, -1, RGB(200, 0, 0));
+  list.InsertColumn(1, "Layer", LVCFMT_LEFT, 60);
+  EXPECT_EQ(list.GetItemTextColor(0, 0), RGB(200, 0, 0));
+  EXPECT_EQ(list.GetItemTextColor(0, 1), ::GetSysColor(COLOR_WINDOWTEXT));
+  EXPECT_EQ(list.GetItemBkColor(0, 1), ::GetSysColor(COLOR_WINDOW));
+  EXPECT_EQ(list.GetItemTextColor(0, 2), RGB(200, 0, 0));
+  EXPECT_TRUE(list.DeleteColumn(0));
+  EXPECT_EQ(list.GetItemTextColor(0, 1), RGB(200, 0, 0));
+  EXPECT_FALSE(list.SetItemTextColor(0, 5, RGB(0, 0, 0)));
+  EXPECT_EQ(list.GetItemImage(9, 0), -1);
+  EXPECT_EQ(list.GetItemData(9), 0U);
 }
 
 TEST_F(ReportListTest, AnEditLeftByAClickElsewhereKeepsItsText) {
