@@ -26,7 +26,9 @@ class DropListBehaviour : public ControlBehaviour {
   void MoveHighlight(HWND hwnd, int delta) {
     const int count = owner_->ItemCount();
     if (count == 0) return;
-    hot_ = std::clamp(hot_ < 0 ? (delta > 0 ? 0 : count - 1) : hot_ + delta, 0, count - 1);
+    // With nothing highlighted the list is entered from its top going down, from its end going up.
+    const int from = hot_ >= 0 ? hot_ : (delta > 0 ? -1 : count);
+    hot_ = std::clamp(from + delta, 0, count - 1);
     if (hot_ < top_) top_ = hot_;
     if (hot_ >= top_ + rows_) top_ = hot_ - rows_ + 1;
     Layout(hwnd);

@@ -244,4 +244,68 @@ TEST_F(ComboMenuTest, AMenuWithItemBitmapsAndAnImageMenuShowTheirPictures) {
   ASSERT_FALSE(GetMenuItemRect(HWND(), displayModes.m_hMenu, 0, &r));  // no longer showing
 }
 
+TEST_F(ComboMenuTest, AMenuOpensCentredOnItsPointAndStaysOnTheScreen) {
+  class Owner : public Parent {
+   public:
+    int initialised = 0;
+
+   protected:
+    LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
+      if (message == WM_INITMENUPOPUP) {
+        ++initialised;
+        ::EnableMenuItem(HMENU::FromParam(wParam), 1, MF_BYCOMMAND | MF_GRAYED);  // the owner may still change it
+      }
+      return Parent::WindowProc(message, wParam, lParam);
+    }
+  } owner;
+  owner.CreateEx(0, framework::kDialogClass, "Owner", WS_POPUP | WS_VISIBLE, CRect(0, 0, 300, 200), nullptr, 0);
+  CMenu menu;
+  menu.CreatePopupMenu();
+  menu.AppendMenu(MF_STRING, 1, "Level 5");
+  menu.AppendMenu(MF_STRING, 2, "Level 10");
+  std::vector<CRect> placed;
+  const auto where = [&placed](framework::ScriptedUser& u, HWND) {
+    RECT r;
+    ::GetWindowRect(u.OpenMenu(), &r);
+    placed.push_back(r);
+    u.ChooseMenuItem(1);  // greyed by the owner: nothing chosen
+    u.DismissMenu();
+  };
+  user.AnswerNext(where);
+  EXPECT_EQ(menu.TrackPopupMenu(TPM_CENTERALIGN | TPM_VCENTERALIGN | TPM_RETURNCMD, 400, 300, &owner), 0);
+  user.AnswerNext(where);
+  menu.TrackPopupMenu(TPM_LEFTALIGN | TPM_RETURNCMD, 1275, 795, &owner);
+  ASSERT_EQ(placed.size(), 2U);
+  EXPECT_EQ(placed[0].CenterPoint(), CPoint(400, 300));
+  EXPECT_EQ(placed[1].right, ::GetSystemMetrics(SM_CXSCREEN));
+  EXPECT_EQ(placed[1].bottom, ::GetSystemMetrics(SM_CYSCREEN));
+  EXPECT_EQ(owner.initialised, 2);
+}
+
+TEST_F(ComboMenuTest, TheDroppedListFollowsKeysAndLettersAndGoesWhenTheComboLosesTheFocus) {
+  CComboBox cut;
+  CComboBox other;
+  ASSERT_TRUE(cut.Create(WS_CHILD | WS_VISIBLE | CBS_DROPDOWNLIST, CRect(10, 10, 150, 120), &parent, 5056));
+  ASSERT_TRUE(other.Create(WS_CHILD | WS_VISIBLE | CBS_DROPDOWNLIST, CRect(200, 10, 300, 120), &parent, 5079));
+  for (const char* text : {"By Color", "Off", "Whole"}) cut.AddString(text);
+  cut.SetFocus();
+  user.Press(VK_F4);
+  EXPECT_TRUE(cut.GetDroppedState());
+  user.Type("w");
+  user.Press(VK_RETURN);
+  EXPECT_EQ(cut.GetLBText(cut.GetCurSel()), "Whole");
+  user.Type("o");  // closed: the letter chooses at once
+  EXPECT_EQ(cut.GetCurSel(), 1);
+  cut.ShowDropDown(TRUE);
+  user.Press(VK_HOME);
+  user.Click(other.m_hWnd);  // the press outside only closes the list, without a choice
+  EXPECT_FALSE(cut.GetDroppedState());
+  EXPECT_EQ(cut.GetCurSel(), 1);
+  EXPECT_EQ(::GetFocus(), cut.m_hWnd);
+  cut.ShowDropDown(TRUE);
+  other.SetFocus();  // the focus going elsewhere takes the list with it
+  EXPECT_FALSE(cut.GetDroppedState());
+  EXPECT_EQ(Heard(5056).back(), std::to_string(CBN_KILLFOCUS));
+}
+
 }  // namespace

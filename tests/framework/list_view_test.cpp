@@ -117,4 +117,24 @@ TEST_F(ListViewTest, TheParentColoursRowsWhileTheListIsDrawn) {
   EXPECT_EQ(inks, (std::vector<std::string>{"#000000", "#0000ff", "#000000"}));
 }
 
+TEST_F(ListViewTest, ALongListScrollsByItsBarAndByTheKeysTheFocusedRowFollows) {
+  for (int i = 3; i < 40; ++i) list.InsertItem(i, std::to_string(i));
+  const int perPage = list.GetCountPerPage();
+  EXPECT_EQ(perPage, (195 - 2 - 20) / 17);  // the client area below the header, in rows
+  user.ClickListCell(list.m_hWnd, 39, 0);  // scrolled to by its bar's arrows
+  EXPECT_EQ(list.GetTopIndex(), 40 - perPage);
+  user.Press(VK_HOME);
+  EXPECT_EQ(list.GetTopIndex(), 0);
+  user.Press(VK_NEXT);
+  EXPECT_EQ(list.GetNextItem(-1, LVNI_FOCUSED), perPage);
+  EXPECT_EQ(list.GetTopIndex(), 1);
+  list.EnsureVisible(30, FALSE);
+  EXPECT_EQ(list.GetTopIndex(), 31 - perPage);
+  const SvgNode picture = ParseSvg(framework::RenderWindow(list.m_hWnd));
+  const auto thumb = FindAll(picture, [](const SvgNode& n) { return n.Attribute("data-part") == "thumb"; });
+  ASSERT_EQ(thumb.size(), 1U);
+  EXPECT_EQ(thumb[0]->Attribute("data-position"), std::to_string(31 - perPage));
+  EXPECT_EQ(thumb[0]->Attribute("data-range"), "0 39");
+}
+
 }  // namespace
