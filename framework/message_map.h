@@ -88,6 +88,7 @@ MessageMapEntry MessageEntry(UINT message, const UINT* registered, LRESULT (T::*
 #define ON_CONTROL(code, id, fn) ::framework::CommandEntry<ThisClass>(WM_COMMAND, code, id, &ThisClass::fn),
 #define ON_BN_CLICKED(id, fn) ON_CONTROL(BN_CLICKED, id, fn)
 #define ON_EN_CHANGE(id, fn) ON_CONTROL(EN_CHANGE, id, fn)
+#define ON_CBN_SELCHANGE(id, fn) ON_CONTROL(CBN_SELCHANGE, id, fn)
 // WM_NOTIFY from control `id` with notification `code`: void fn(NMHDR*, LRESULT*).
 #define ON_NOTIFY(code, id, fn) ::framework::NotifyEntry<ThisClass>(WM_NOTIFY, code, id, &ThisClass::fn),
 // Notifications a control handles itself when its parent reflects them back to it.
