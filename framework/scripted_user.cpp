@@ -19,7 +19,6 @@ namespace {
 
 constexpr DWORD kLabelEditWait = 600;  // longer than the tree waits before it opens its editor
 
-
 HWND Search(HWND within, const std::function<bool(HWND)>& match) {
   for (HWND child : GetChildren(within)) {
     if (match(child)) return child;
