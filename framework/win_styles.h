@@ -146,7 +146,6 @@ constexpr DWORD CBS_TYPEMASK = 0x0003;
 
 // Progress-bar styles.
 constexpr DWORD PBS_SMOOTH = 0x0001;
-constexpr DWORD PBS_VERTICAL = 0x0004;
 
 // Tool-tip styles and tool flags.
 constexpr DWORD TTS_ALWAYSTIP = 0x0001;
