@@ -12,6 +12,7 @@
 
 #include "app/build_2d_command.h"
 #include "app/drawing_summary.h"
+#include "app/pane_command.h"
 #include "app/plugin_session.h"
 #include "app/view_edit.h"
 #include "app/views_summary.h"
@@ -82,9 +83,12 @@ int main(int argc, char** argv) {
       ->check(CLI::Range(0, 10));
   addCamera->add_flag("--no-tick", noTick, "Do not tick the camera for 2D");
 
+  const app::PaneCommand pane(app);
+
   CLI11_PARSE(app, argc, argv);
 
   try {
+    if (pane.Chosen()) return pane.Run(std::cout, std::cerr);
     if (*build2d) {
       static const std::map<std::string, HRUtility::BuildMode> kModes = {{"all", HRUtility::BuildMode::All},
                                                                          {"cameras", HRUtility::BuildMode::Cameras},
