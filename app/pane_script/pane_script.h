@@ -76,7 +76,7 @@ struct SetView {  // view EYE-X,Y,Z TARGET-X,Y,Z [perspective|parallel]: the use
 struct Save {  // save [FILE]: the drawing, to its own file or to FILE
   std::string file;
 };
-struct Print {};  // print: the tree the pane shows, as text on standard output
+struct Print {};  // print: the tab and the tree the pane holds (shown or not), on standard output
 
 using ActionKind = std::variant<SelectTab, Click, Hover, SelectItem, SetCheck, Rename, PickPoints, Answer,
                                 RunSubCommand, Wait, ResizePane, SetView, Save, Print>;

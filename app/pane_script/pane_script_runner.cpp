@@ -230,10 +230,11 @@ void Runner::Do(const Save& action) {
   out_ << "Saved the drawing to " << file << '\n';
 }
 
+// What the pane holds, shown or not.
 void Runner::Do(const Print&) {
-  const int tab = static_cast<int>(::SendMessage(PaneControl(kTabsId), TCM_GETCURSEL, 0, 0));
+  const int tab = static_cast<int>(::SendMessage(user_.Find(kTabsId, frame_.m_hWnd), TCM_GETCURSEL, 0, 0));
   out_ << (tab >= 0 && tab < 3 ? kTabNames[tab] : "No tab") << ":\n";
-  const Viewed<CTreeCtrl> tree(Tree());
+  const Viewed<CTreeCtrl> tree(user_.Find(kTreeId, frame_.m_hWnd));
   PrintItems(tree, tree.GetRootItem(), 0, out_);
 }
 
