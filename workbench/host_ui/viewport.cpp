@@ -1,13 +1,18 @@
-// Drawing the viewport: a line that says how the host looks at the drawing, the cut that is
-// active and the points picked so far.
+// Drawing the viewport: the drawing as the host's view shows it (the same 2D drawing the host's
+// 2D commands make of it), under lines that say how it is looked at, the cut that is active and
+// the points picked so far.
 #include "workbench/host_ui/viewport.h"
 
 #include <cstdio>
+#include <sstream>
+#include <stdexcept>
 #include <string>
 
 #include "framework/canvas.h"
 #include "framework/text_metrics.h"
 #include "framework/window_class.h"
+#include "workbench/draft/generate_sheet.h"
+#include "workbench/draft/svg_writer.h"
 #include "workbench/workbench.h"
 
 namespace wb::ui {
@@ -24,6 +29,29 @@ std::string ViewText(const ViewState& view) {
   std::string text = view.threeD ? "3D " : "2D ";
   text += view.perspective ? "perspective" : "parallel";
   return text + " view from " + PointText(view.eye) + " to " + PointText(view.target);
+}
+
+// The view's 2D drawing as an SVG picture: hidden lines removed while the display is solid, the
+// cuts applied. Empty when the drawing holds nothing the view shows.
+std::string ModelPicture() {
+  Workbench& bench = Workbench::Get();
+  const Drawing* drawing = bench.Find(bench.Current());
+  if (drawing == nullptr) return {};
+  const ViewState& view = bench.View();
+  draft::GenerateOptions options;
+  options.view = {view.eye, view.target, view.perspective};
+  options.hideHiddenLines = bench.Display().SolidState();
+  if (view.section.active) options.section = draft::SectionCut{view.section.points, view.section.cutType};
+  if (view.plan.active) options.plan = draft::PlanCut{view.plan.base, view.plan.cutType};
+  const draft::Sheet sheet = draft::GenerateSheet(*drawing, options);
+  if (sheet.strokes.empty() && sheet.labels.empty()) return {};
+  std::ostringstream picture;
+  try {
+    draft::SvgWriter().Write(sheet, picture);
+  } catch (const std::invalid_argument&) {
+    return {};  // a value no picture can carry: the view stays empty
+  }
+  return picture.str();
 }
 
 }  // namespace
@@ -64,6 +92,9 @@ void Viewport::Paint(Canvas& canvas) const {
     canvas.Text(10, top + framework::kFontAscent, line, {RGB(60, 60, 60), false, Canvas::Anchor::kStart});
     top += framework::kLineHeight + 4;
   }
+  const std::string model = ModelPicture();
+  CRect place(client.left + 10, top + 6, client.right - 10, client.bottom - 10);
+  if (!model.empty() && place.Width() > 0 && place.Height() > 0) canvas.Picture(place, model, false, {{"data-part", "model"}});
 }
 
 }  // namespace wb::ui
