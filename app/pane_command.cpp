@@ -5,6 +5,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <optional>
 #include <sstream>
 
 #include "app/pane_script/pane_script.h"
@@ -12,6 +13,7 @@
 #include "app/plugin_session.h"
 #include "samples/sample_drawing.h"
 #include "workbench/drawing_file.h"
+#include "workbench/drawing_file_lock.h"
 #include "workbench/host_ui/main_frame.h"
 #include "workbench/workbench.h"
 
@@ -33,12 +35,14 @@ std::string ReadScriptFile(const std::string& path) {
 
 }  // namespace
 
-PaneCommand::PaneCommand(CLI::App& program) {
+PaneCommand::PaneCommand(CLI::App& program, const CLI::Validator& named) {
   command_ = program.add_subcommand(
       "pane", "Show the manager pane docked in the workbench's main window and do what a script of a user's actions says");
-  command_->add_option("DRAWING", drawing_, "Drawing file, saved when the script says so (default: the built-in sample house)");
-  command_->add_option("--script", script_, "The user's actions, one a line (see the README)")->required();
-  command_->add_option("--render", renderFolder_, "Folder for a picture (SVG) of the screen after each action");
+  command_->add_option("DRAWING", drawing_, "Drawing file, saved when the script says so (default: the built-in sample house)")
+      ->check(named);
+  command_->add_option("--script", script_, "The user's actions, one a line (see the README)")->required()->check(named);
+  command_->add_option("--render", renderFolder_, "Folder for a picture (SVG) of the screen after each action")
+      ->check(named);
   command_->add_flag("--undocked", undocked_, "The host does not dock panes: the pane stays a plain window in the frame");
 }
 
@@ -55,6 +59,9 @@ int PaneCommand::Run(std::ostream& out, std::ostream& err) const {
   }
   if (!renderFolder_.empty()) std::filesystem::create_directories(renderFolder_);
 
+  // The pane edits the drawing: no other command changes it while the script runs.
+  std::optional<wb::DrawingFileLock> lock;
+  if (!drawing_.empty()) lock.emplace(drawing_, wb::DrawingFileLock::Mode::Exclusive);
   const PluginSession session(drawing_.empty() ? samples::MakeSampleDrawing() : wb::OpenDrawingFile(drawing_));
   wb::Workbench& bench = wb::Workbench::Get();
   if (!drawing_.empty()) bench.SetDrawingPath(bench.Current(), drawing_);

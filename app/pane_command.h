@@ -7,14 +7,15 @@
 
 namespace CLI {
 class App;
+class Validator;
 }
 
 namespace app {
 
 class PaneCommand {
  public:
-  // Adds the command and its options to the program.
-  explicit PaneCommand(CLI::App& program);
+  // Adds the command and its options to the program; `named` refuses an empty file name.
+  PaneCommand(CLI::App& program, const CLI::Validator& named);
 
   bool Chosen() const;
   // Loads the drawing (the sample house without one) and the plug-in, shows the pane, runs the
