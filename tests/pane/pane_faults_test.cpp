@@ -21,12 +21,24 @@ TEST_F(PaneTest, AddNewGivesUpWithAMessageWhenTheDisplayStaysOutOfPlainGeometry)
   EXPECT_TRUE(Bench().CommandLines().empty()) << "no points were asked for";
 }
 
-TEST_F(PaneTest, ACameraViewThatCouldNotBeMadeAddsNoItem) {
+TEST_F(PaneTest, CamerasThatCouldNotBeStoredAddNoItem) {
   const std::vector<std::int32_t> cameras = Longs(*OfClass("HRSection")[0], "@CamLst=");
   Bench().GetFaults().Add({.call = "qel_create_group", .entity = wb::FaultRule::kAnyEntity, .attribute = "", .times = -1});
+  Run("click add\nrun 6");
+  EXPECT_EQ(Tree(), "Cameras:\n  [x] Street perspective\n  [x] Axonometric\n  [x] Site plan\n");
   Run("tab sections\nselect A\nclick add-view");
   EXPECT_EQ(Tree(), "Sections:\n  [ ] A\n    [x] Default\n  [ ] B\n    [x] Default\n");
   EXPECT_EQ(Longs(*OfClass("HRSection")[0], "@CamLst="), cameras);
+}
+
+// A name the drawing did not take is not shown either.
+TEST_F(PaneTest, ANameTheDrawingRefusedLeavesTheOldLabel) {
+  Bench().GetFaults().Add({.call = "qel_set_string_attribute", .entity = wb::FaultRule::kAnyEntity,
+                           .attribute = "@CAMNAME=", .times = -1});
+  Run("rename \"Site plan\" Garden");
+  EXPECT_EQ(Tree(), "Cameras:\n  [x] Street perspective\n  [x] Axonometric\n  [x] Site plan\n");
+  EXPECT_EQ(OfClass("HRCamera").size(), 3U);
+  EXPECT_EQ(Text(CameraNamed("Site plan"), "@CAMNAME="), "Site plan");
 }
 
 TEST_F(PaneTest, ACameraThatNoLongerLoadsIsNotWrittenOverByUpdateOrTicks) {
