@@ -8,7 +8,6 @@
 #include "framework/cwinapp.h"
 #include "framework/data_exchange.h"
 #include "framework/resource_module.h"
-#include "model/current_database.h"
 #include "shell/host/argument_blocks.h"
 #include "shell/host/pane_manager.h"
 #include "shell/host/qelinfo.h"

@@ -1,6 +1,7 @@
 // What the pane's buttons and the host's sub-commands do: add, remove, update and execute
 // cameras, sections and plans, and reload the drawing.
 #include <algorithm>
+#include <array>
 #include <string>
 
 #include "display/display_mode.h"
@@ -29,7 +30,6 @@ constexpr int kGeometricAttempts = 3;
 // A new section or plan is picked in plain geometry.
 bool SectionReady() { return globc[26] == 'w' && globc[32] != 'a' && globc[32] != 'r'; }
 
-
 void RefuseMode() { AfxMessageBox(resources::kIdsModeRefused, MB_OK, 0); }
 
 }  // namespace
@@ -57,10 +57,8 @@ void CPandexDlg::CreateSection(const host::Point3f& start, const host::Point3f& 
   const std::string name =
       pane::DefaultName(AfxLoadString(kSectionWord), static_cast<std::int32_t>(sectionHandles_.size()), RootTexts());
   SectionSettings settings;
-  const float* from = &start.x;
-  const float* to = &end.x;
-  std::copy(from, from + 3, settings.start);
-  std::copy(to, to + 3, settings.end);
+  std::copy_n(std::array{start.x, start.y, start.z}.begin(), 3, settings.start);
+  std::copy_n(std::array{end.x, end.y, end.z}.begin(), 3, settings.end);
   const CPandexApp* app = TheApp();
   settings.symbolFile = app->symbolFile;
   settings.lineType = static_cast<std::uint16_t>(app->lineType);
@@ -83,7 +81,9 @@ void CPandexDlg::CreatePlan(const host::Point3f& base, const host::Point3f& seco
   const std::string name =
       pane::DefaultName(AfxLoadString(kPlanWord), static_cast<std::int32_t>(planHandles_.size()), RootTexts());
   HRPlane plan;
-  plan.DefineFromPoints(name, &base.x, &second.x);
+  const float from[3] = {base.x, base.y, base.z};
+  const float towards[3] = {second.x, second.y, second.z};
+  plan.DefineFromPoints(name, from, towards);
   plan.Create();
   plan.ShowView(-1);
   plan.AddCamera(AfxLoadString(resources::kIdsDefaultCamera));

@@ -59,17 +59,25 @@ void Runner::Run(const Script& script) {
   lastStarted_ = nullptr;
   rendered_ = false;
   while (next_ < script.actions.size() && !failure_) Step();
-  if (!failure_) RenderPending();
+  // The last picture shows the end, or what the screen held when an action could not be done.
+  try {
+    RenderPending();
+  } catch (const std::exception& error) {
+    if (!failure_) failure_ = ScriptError(lastStarted_ != nullptr ? lastStarted_->line : 0, error.what());
+  }
   script_ = nullptr;
   if (failure_) throw *failure_;
 }
 
+// Nothing thrown here leaves it: the action may run inside the plug-in's handlers (answering a
+// message box they opened), which must not be unwound.
 void Runner::Step() {
-  RenderPending();
-  const Action& action = script_->actions[next_++];
-  lastStarted_ = &action;
-  rendered_ = false;
+  const Action& action = script_->actions[next_];
   try {
+    RenderPending();
+    ++next_;
+    lastStarted_ = &action;
+    rendered_ = false;
     std::visit([this](const auto& kind) { Do(kind); }, action.kind);
     // A person takes a moment between two actions: tips the mouse has left go away.
     user_.Wait(kPauseMs);
