@@ -61,6 +61,7 @@ void Runner::Run(const Script& script) {
   while (next_ < script.actions.size() && !failure_) Step();
   // The last picture shows the end, or what the screen held when an action could not be done.
   try {
+    user_.Wait(kPauseMs);
     RenderPending();
   } catch (const std::exception& error) {
     if (!failure_) failure_ = ScriptError(lastStarted_ != nullptr ? lastStarted_->line : 0, error.what());
@@ -74,13 +75,14 @@ void Runner::Run(const Script& script) {
 void Runner::Step() {
   const Action& action = script_->actions[next_];
   try {
+    // A person takes a moment between two actions (tips the mouse has left go away), then
+    // looks at the screen: that is the picture of the last action.
+    if (lastStarted_ != nullptr) user_.Wait(kPauseMs);
     RenderPending();
     ++next_;
     lastStarted_ = &action;
     rendered_ = false;
     std::visit([this](const auto& kind) { Do(kind); }, action.kind);
-    // A person takes a moment between two actions: tips the mouse has left go away.
-    user_.Wait(kPauseMs);
   } catch (const ScriptError& error) {
     if (!failure_) failure_ = error;
   } catch (const std::exception& error) {
