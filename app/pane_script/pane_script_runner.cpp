@@ -96,7 +96,14 @@ bool Runner::AwaitInput(HWND modalWindow) {
   if (script_ == nullptr || failure_) return false;
   const int line = lastStarted_ != nullptr ? lastStarted_->line : 0;
   if (next_ >= script_->actions.size()) {
-    failure_ = ScriptError(line, DescribeWaiting(modalWindow) + " when the script ended");
+    const std::string waiting = DescribeWaiting(modalWindow);
+    // The last picture shows the window left waiting; the failure is reported either way.
+    try {
+      user_.Wait(kPauseMs);
+      RenderPending();
+    } catch (const std::exception&) {
+    }
+    failure_ = ScriptError(line, waiting + " when the script ended");
     return false;
   }
   if (depth_ == kMaxDepth) {
