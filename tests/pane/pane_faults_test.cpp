@@ -31,6 +31,16 @@ TEST_F(PaneTest, CamerasThatCouldNotBeStoredAddNoItem) {
   EXPECT_EQ(Longs(*OfClass("HRSection")[0], "@CamLst="), cameras);
 }
 
+// A section deleted behind the pane's back gets no camera that nothing would list.
+TEST_F(PaneTest, ACameraViewOfASectionThatIsGoneReloadsInstead) {
+  Run("tab sections\nselect A");
+  Drawing().Remove(OfClass("HRSection")[0]->handle);
+  const std::size_t cameras = OfClass("hrSecCam").size();
+  Run("click add-view");
+  EXPECT_EQ(OfClass("hrSecCam").size(), cameras);
+  EXPECT_EQ(Tree(), "Sections:\n  [ ] B\n    [x] Default\n");
+}
+
 // A name the drawing did not take is not shown either.
 TEST_F(PaneTest, ANameTheDrawingRefusedLeavesTheOldLabel) {
   Bench().GetFaults().Add({.call = "qel_set_string_attribute", .entity = wb::FaultRule::kAnyEntity,
