@@ -14,6 +14,7 @@
 #include "app/build_2d_command.h"
 #include "app/drawing_access.h"
 #include "app/drawing_summary.h"
+#include "app/pane_command.h"
 #include "app/plugin_session.h"
 #include "app/ui_gallery_command.h"
 #include "app/view_edit.h"
@@ -89,6 +90,8 @@ int main(int argc, char** argv) {
   addCamera->add_flag("--no-tick", noTick, "Do not tick the camera for 2D");
   CLI::App* gallery = app::AddUiGalleryCommand(app);
 
+  const app::PaneCommand pane(app, kNamed);
+
   try {
     app.parse(argc, argv);
   } catch (const CLI::Success& done) {  // --help
@@ -101,6 +104,7 @@ int main(int argc, char** argv) {
 
   try {
     if (*gallery) return app::RunUiGallery(*gallery, std::cout);
+    if (pane.Chosen()) return pane.Run(std::cout, std::cerr);
     if (*build2d) {
       static const std::map<std::string, HRUtility::BuildMode> kModes = {{"all", HRUtility::BuildMode::All},
                                                                          {"cameras", HRUtility::BuildMode::Cameras},
