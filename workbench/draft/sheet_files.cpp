@@ -2,14 +2,7 @@
 // touched, so every failure that can be foreseen happens while the old files are still whole.
 #include "workbench/draft/sheet_files.h"
 
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
-
-#include <cerrno>
-#include <cstdio>
 #include <map>
-#include <random>
 #include <sstream>
 #include <string>
 #include <system_error>
@@ -18,92 +11,18 @@
 #include "workbench/draft/dxf_reader.h"
 #include "workbench/draft/dxf_writer.h"
 #include "workbench/draft/file_lock.h"
+#include "workbench/draft/pending_file.h"
 #include "workbench/draft/svg_writer.h"
 
 namespace wb::draft {
 namespace {
 
-[[noreturn]] void Fail(const std::filesystem::path& path, const char* doing, int error) {
-  throw SheetFileError("cannot " + std::string(doing) + ' ' + path.string() + ": " +
-                       std::generic_category().message(error));
-}
-
-std::filesystem::path FolderOf(const std::filesystem::path& path) {
-  return path.has_parent_path() ? path.parent_path() : std::filesystem::path(".");
-}
-
-// ".<name>.<16 hex digits>.tmp" beside the target: hidden, and on the same file system, which
-// is what makes the rename atomic.
-std::filesystem::path TemporaryName(const std::filesystem::path& target) {
-  std::random_device random;
-  char digits[17];
-  std::snprintf(digits, sizeof digits, "%08x%08x", random(), random());
-  return FolderOf(target) / ('.' + target.filename().string() + '.' + digits + ".tmp");
-}
-
-void WriteAll(int fd, std::string_view content, const std::filesystem::path& path) {
-  while (!content.empty()) {
-    const ssize_t written = write(fd, content.data(), content.size());
-    if (written < 0 && errno == EINTR) continue;
-    if (written < 0) Fail(path, "write", errno);
-    content.remove_prefix(static_cast<std::size_t>(written));
-  }
-}
-
-void SyncFolder(const std::filesystem::path& folder) {
-  const int fd = open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-  if (fd < 0) Fail(folder, "open the folder", errno);
-  const int result = fsync(fd);
-  const int error = errno;
-  close(fd);
-  if (result != 0) Fail(folder, "sync the folder", error);
-}
-
-// A new version of one file, complete and on disk under its temporary name until Commit.
-class PendingFile {
- public:
-  PendingFile(const std::filesystem::path& target, std::string_view content) : target_(target) {
-    int fd = -1;
-    for (int attempt = 0; fd < 0; ++attempt) {
-      temporary_ = TemporaryName(target);
-      fd = open(temporary_.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
-      if (fd < 0 && (errno != EEXIST || attempt == 8)) Fail(target, "write", errno);
-    }
-    try {
-      // The new version keeps the permissions the user gave the old one.
-      struct stat old {};
-      if (stat(target.c_str(), &old) == 0 && S_ISREG(old.st_mode)) fchmod(fd, old.st_mode & 07777);
-      WriteAll(fd, content, target);
-      if (fsync(fd) != 0) Fail(target, "sync", errno);
-      const int closed = close(std::exchange(fd, -1));
-      if (closed != 0) Fail(target, "write", errno);
-    } catch (...) {
-      if (fd >= 0) close(fd);
-      unlink(temporary_.c_str());
-      throw;
-    }
-  }
-  ~PendingFile() {
-    if (!committed_) unlink(temporary_.c_str());
-  }
-  PendingFile(const PendingFile&) = delete;
-  PendingFile& operator=(const PendingFile&) = delete;
-
-  void Commit() {
-    if (rename(temporary_.c_str(), target_.c_str()) != 0) Fail(target_, "replace", errno);
-    committed_ = true;
-  }
-
- private:
-  std::filesystem::path target_;
-  std::filesystem::path temporary_;
-  bool committed_ = false;
-};
-
 // Renaming a file over a folder fails; found before the first rename, it leaves both old files.
 void RefuseFolderAt(const std::filesystem::path& path) {
   std::error_code ignored;
-  if (std::filesystem::is_directory(std::filesystem::symlink_status(path, ignored))) Fail(path, "replace", EISDIR);
+  if (std::filesystem::is_directory(std::filesystem::symlink_status(path, ignored))) {
+    FailOnFile(path, "replace", std::make_error_code(std::errc::is_a_directory));
+  }
 }
 
 std::string Serialize(const SheetWriter& writer, const Sheet& sheet, const std::filesystem::path& path) {
