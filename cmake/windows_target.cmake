@@ -1,6 +1,6 @@
 # 32-bit Windows: the plug-in as Pandex.dll, exporting its entry, over the host's libraries made
-# from the workbench (QELDLL.dll, QELINFO.dll, DsgMode.dll), and a program that loads Pandex.dll
-# as the host does and checks a journey through it, run by CTest under wine.
+# from the workbench (QELDLL.dll, QELINFO.dll, DsgMode.dll), and the journey in tests/windows
+# that loads Pandex.dll as the host does, run by CTest under wine.
 #
 # Drawing files are left out of the Windows host: Debian has no SQLite for MinGW, and the
 # journey keeps its drawing in memory. Everything else of the workbench is there.
@@ -40,22 +40,16 @@ target_link_libraries(Pandex PRIVATE "$<LINK_LIBRARY:WHOLE_ARCHIVE,pandex_plugin
 set_target_properties(Pandex PROPERTIES PREFIX "")
 target_link_options(Pandex PRIVATE -static)
 
-add_executable(pandex_dll_journey tests/windows/plugin_dll_journey.cpp tests/record_layout/record_layout.cpp)
-target_link_libraries(pandex_dll_journey PRIVATE pandex_samples)
-add_dependencies(pandex_dll_journey Pandex)
+# The C++ runtime the host's libraries share, beside them.
 foreach(runtime libstdc++-6.dll libgcc_s_dw2-1.dll libwinpthread-1.dll)
   execute_process(COMMAND ${CMAKE_CXX_COMPILER} -print-file-name=${runtime}
                   OUTPUT_VARIABLE runtime_path OUTPUT_STRIP_TRAILING_WHITESPACE)
   file(COPY ${runtime_path} DESTINATION ${CMAKE_BINARY_DIR})
 endforeach()
 # One folder holds every library and program, as the host's own folder would.
-set_target_properties(pandex_workbench QELINFO DsgMode Pandex pandex_dll_journey PROPERTIES
-  RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
+set_target_properties(pandex_workbench QELINFO DsgMode Pandex PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
 
 if(PANDEX_TESTS)
   enable_testing()
-  add_test(NAME WindowsPluginJourney COMMAND pandex_dll_journey WORKING_DIRECTORY ${CMAKE_BINARY_DIR})
-  # A private wine prefix inside the build, made on first use; wine's own chatter is kept quiet.
-  set_tests_properties(WindowsPluginJourney PROPERTIES
-    ENVIRONMENT "WINEPREFIX=${CMAKE_BINARY_DIR}/wineprefix;WINEDEBUG=-all;WINEDLLOVERRIDES=mscoree,mshtml=")
+  add_subdirectory(tests/windows)
 endif()
