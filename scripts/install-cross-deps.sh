@@ -7,13 +7,6 @@ SUDO=""
 [ "$(id -u)" -eq 0 ] || SUDO="sudo"
 # wine32 and the 32-bit SQLite are packages of Debian's i386 architecture.
 dpkg --print-foreign-architectures | grep -qx i386 || $SUDO dpkg --add-architecture i386
-packages=(g++-mingw-w64-i686 g++-multilib googletest libsqlite3-dev:i386 wine wine32:i386)
-missing=()
-for package in "${packages[@]}"; do
-  dpkg-query -W -f='${Status}' "$package" 2>/dev/null | grep -q "install ok installed" || missing+=("$package")
-done
-if ((${#missing[@]})); then
-  echo "Installing: ${missing[*]}"
-  $SUDO apt-get update -qq
-  DEBIAN_FRONTEND=noninteractive $SUDO apt-get install -y -qq --no-install-recommends "${missing[@]}"
-fi
+# Without wine's recommended desktop extras (fonts, sound, graphics): the journey is a console program.
+APT_INSTALL_OPTIONS=--no-install-recommends exec "$(dirname "$0")/install-deps.sh" \
+  g++-mingw-w64-i686 g++-multilib googletest libsqlite3-dev:i386 wine wine32:i386
