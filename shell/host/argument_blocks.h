@@ -22,9 +22,11 @@ struct DbBlock {
 }  // namespace host
 
 extern "C" {
+
 extern QELDLL_DATA std::int32_t globi[host::kGlobiSize];
 extern QELDLL_DATA float globr[host::kGlobrSize];
 extern QELDLL_DATA host::Point3f globp[host::kGlobpSize];
 extern QELDLL_DATA char globc[host::kGlobcSize];
 extern QELDLL_DATA host::DbBlock db;
-}
+
+}  // extern "C"
