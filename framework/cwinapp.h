@@ -1,18 +1,34 @@
-// Base of the library's application object; the UI layer finds the running one through it.
+// The library's application object and the main window its windows are parented to.
 #pragma once
 
-class CWnd;
+#include <string>
 
-class CWinApp {
+#include "framework/cwnd.h"
+#include "framework/resource_module.h"
+
+class CWinApp : public CCmdTarget {
  public:
   CWinApp();
-  CWinApp(const CWinApp&) = delete;
-  CWinApp& operator=(const CWinApp&) = delete;
-  virtual ~CWinApp();
+  ~CWinApp() override;
 
   // The application object of the loaded library, or null.
   static CWinApp* Current();
+
+  HICON LoadIcon(UINT id) const { return AfxLoadIcon(id); }
+
+  // The application's own main window, when it has one; a library inside a host has none.
+  CWnd* m_pMainWnd = nullptr;
 };
 
-// The main window of the current thread: null while the host has given the library none.
+CWinApp* AfxGetApp();
+
+// The main window of the user-interface thread: the host's main window when the host gave one,
+// else the application's own, else null.
 CWnd* AfxGetMainWnd();
+
+namespace framework {
+
+// The host names its main window (null when it closes it).
+void SetHostMainWindow(HWND hwnd);
+
+}  // namespace framework

@@ -4,7 +4,9 @@
 #include <memory>
 #include <optional>
 
+#include "framework/resource_module.h"
 #include "model/current_database.h"
+#include "resources/resource_module.h"
 #include "shell/host/argument_blocks.h"
 #include "shell/pandex_app.h"
 #include "shell/pane_instance.h"
@@ -49,6 +51,7 @@ CPandexApp* TheApp() { return application.get(); }
 namespace pandex {
 
 void LibraryAttach() {
+  framework::SetResourceModule(&resources::Module());
   application = std::make_unique<CPandexApp>();
   CreateCameraManager();
   SetCurrentDatabase(db.handle);
@@ -61,6 +64,7 @@ void LibraryDetach() {
   DestroyCameraManager();
   SetCurrentDatabase(0);
   application.reset();
+  framework::SetResourceModule(nullptr);
 }
 
 }  // namespace pandex

@@ -4,6 +4,8 @@
 #include <string>
 #include <vector>
 
+#include "framework/controls/tab_control.h"
+#include "framework/window_classes.h"
 #include "model/current_database.h"
 #include "shell/host/argument_blocks.h"
 #include "shell/pandex_app.h"
@@ -19,13 +21,17 @@ struct SentMessage {
   LPARAM lParam;
 };
 
-class RecordingTabs : public CWnd {
+// A tab control window that writes down the tab-control messages it receives.
+class RecordingTabs : public CTabCtrl {
  public:
-  LRESULT SendMessage(UINT message, WPARAM wParam, LPARAM lParam) override {
-    sent.push_back({message, wParam, lParam});
-    return 0;
-  }
+  RecordingTabs() { CreateEx(0, framework::kTabControlClass, "", WS_POPUP, CRect(0, 0, 100, 30), nullptr, 0); }
   std::vector<SentMessage> sent;
+
+ protected:
+  LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
+    if (message >= TCM_FIRST && message < TCM_FIRST + 0x100) sent.push_back({message, wParam, lParam});
+    return CTabCtrl::WindowProc(message, wParam, lParam);
+  }
 };
 
 // Stands in for the pane and writes down every operation the entry starts.

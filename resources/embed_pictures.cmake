@@ -1,0 +1,16 @@
+# Writes a C++ source that holds each picture file of icons/ as a string, found by the number
+# its name starts with ("5002_add_new.svg" is picture 5002).
+file(WRITE "${OUTPUT}" "// Built from resources/icons by embed_pictures.cmake; do not edit.\n")
+file(APPEND "${OUTPUT}" "#include \"resources/resource_module.h\"\n\nnamespace resources {\nnamespace {\n")
+file(APPEND "${OUTPUT}" "struct Picture {\n  UINT id;\n  std::string_view svg;\n};\n")
+file(APPEND "${OUTPUT}" "constexpr Picture kPictures[] = {\n")
+file(GLOB INPUTS "${INPUT_DIR}/*.svg")
+list(SORT INPUTS)
+foreach(input IN LISTS INPUTS)
+  get_filename_component(name "${input}" NAME)
+  string(REGEX MATCH "^[0-9]+" id "${name}")
+  file(READ "${input}" content)
+  file(APPEND "${OUTPUT}" "    {${id}, R\"picture(${content})picture\"},\n")
+endforeach()
+file(APPEND "${OUTPUT}" "};\n}  // namespace\n\nstd::string_view FindPicture(UINT id) {\n")
+file(APPEND "${OUTPUT}" "  for (const Picture& p : kPictures) {\n    if (p.id == id) return p.svg;\n  }\n  return {};\n}\n\n}  // namespace resources\n")
