@@ -115,6 +115,21 @@ void SubCommandJourney() {
   Check(bench.CurrentDrawing() == before, "sub-commands 7, 8, 5 and unknown codes leave the drawing unchanged");
 }
 
+// A target another program holds open without sharing, as an editor does, is in use: the
+// cameras' build skips it and leaves it as it was, and makes the others.
+void LockedTargetJourney(const HRUtility::BuildStep& first) {
+  const std::filesystem::path dxf = first.file + ".dxf";
+  const std::string before = ReadFile(dxf);
+  HANDLE held = CreateFileW(dxf.c_str(), GENERIC_READ | GENERIC_WRITE, 0, nullptr, OPEN_EXISTING, 0, nullptr);
+  HRUtility::Build2DBatch cameras(HRUtility::BuildMode::Cameras, {}, {});
+  const HRUtility::BuildResult result = cameras.Run();
+  CloseHandle(held);
+  Check(held != INVALID_HANDLE_VALUE && result.steps.size() == 3 &&
+            result.steps[0].outcome == HRUtility::BuildStep::Outcome::Locked && result.Saved() == 2 &&
+            ReadFile(dxf) == before,
+        "a target held open by another program is skipped as in use and kept, the others are made");
+}
+
 // The 2D build of every ticked view. The batch runs in this program (the pane's "Build 2D" menu
 // is its way in on the real host); each switch back to the geometric mode runs the host's
 // overlay "Pandex", which re-enters the loaded library.
@@ -140,6 +155,7 @@ void BuildJourney(const std::filesystem::path& folder) {
     filesWhole = filesWhole && whole;
   }
   Check(filesWhole, "every view has a DXF with lines and an SVG preview in the 2D_ folder");
+  if (!result.steps.empty()) LockedTargetJourney(result.steps.front());
   pandex::LibraryDetach();
 }
 
