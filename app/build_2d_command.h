@@ -10,9 +10,10 @@ namespace app {
 
 struct Build2DOptions {
   std::string drawing;    // empty: the built-in sample
-  std::string outputDir;  // where the sample counts as saved (its 2D_ folder goes there)
+  std::string outputDir;  // receives the 2D_ folder in place of the drawing's folder; empty: no such folder
   HRUtility::BuildMode mode = HRUtility::BuildMode::All;
   bool progressBar = false;  // redraw one line on a terminal instead of a line per view
+  bool ownFilesAnywhere = false;  // cameras' own 2D files may lie outside the drawing's folder
 };
 
 // Runs the batch; answers the process exit code (0 when every ticked view was saved).

@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <cstring>
 #include <filesystem>
+#include <optional>
 #include <system_error>
 
 #include "display/save2d.h"
@@ -20,28 +21,6 @@ namespace {
 
 constexpr std::int32_t kTargetKind = 10;
 constexpr int kPlanNameSlot = 210;
-// Room for the 2D files' extensions and the temporary suffix of a safe write within the
-// usual 255-byte limit of a file name.
-constexpr std::size_t kMaxFileNameBytes = 200;
-
-// Characters no file system takes inside a name, and the separators of any of them.
-bool Refused(unsigned char c) { return c < 0x20 || c == 0x7F || std::strchr("/\\<>:\"|?*", c) != nullptr; }
-
-std::string SafeNamePart(const std::string& text) {
-  std::string safe;
-  safe.reserve(text.size());
-  for (const char c : text) safe.push_back(Refused(static_cast<unsigned char>(c)) ? '_' : c);
-  return safe;
-}
-
-// Cuts at a character boundary so a multi-byte character is never split.
-std::string Shortened(std::string name) {
-  if (name.size() <= kMaxFileNameBytes) return name;
-  std::size_t cut = kMaxFileNameBytes;
-  while (cut > 0 && (static_cast<unsigned char>(name[cut]) & 0xC0) == 0x80) --cut;
-  name.resize(cut);
-  return name;
-}
 
 // The plan pass hands the host the name from globc[210] on; it never runs past the block.
 void PutPlanName(const std::string& file) {
@@ -62,18 +41,6 @@ bool Locked(const std::string& file) {
 std::int32_t BuildResult::Saved() const {
   return static_cast<std::int32_t>(
       std::count_if(steps.begin(), steps.end(), [](const BuildStep& s) { return s.outcome == BuildStep::Outcome::Saved; }));
-}
-
-OutputNames OutputNamesFor(const std::string& drawingPath) {
-  const std::filesystem::path path(drawingPath);
-  return {(path.parent_path() / "2D_").string(), SafeNamePart(path.stem().string()) + "_"};
-}
-
-std::string DefaultOutputFile(const OutputNames& names, const std::string& viewName) {
-  std::string file = Shortened(names.prefix + SafeNamePart(viewName));
-  // "." and ".." alone would name a folder; a prefix normally prevents it, an empty one not.
-  if (file.empty() || file == "." || file == "..") file = "_" + file;
-  return (std::filesystem::path(names.folder) / file).string();
 }
 
 Build2DBatch::Build2DBatch(BuildMode mode, std::vector<host::EntityHandle> sections,
@@ -114,10 +81,21 @@ std::int32_t Build2DBatch::Count() const {
 
 void Build2DBatch::Generate(const HRCamera& camera, std::string view, std::string file, bool plan,
                             BuildResult& result) {
-  if (!camera.Get2DFile().empty()) file = camera.Get2DFile();
   BuildStep& step = result.steps.emplace_back();
   step.view = std::move(view);
-  step.file = std::move(file);
+  if (!camera.Get2DFile().empty()) {
+    std::optional<std::string> own = OwnOutputFile(camera.Get2DFile(), drawingFolder_, ownFilesAnywhere_, step.reason);
+    if (!own) {
+      step.file = camera.Get2DFile();
+      step.outcome = BuildStep::Outcome::Failed;
+      Report(step);
+      return;
+    }
+    file = std::move(*own);
+  }
+  OutputFileClaims::Claim claim = claims_.Take(step.view, file, camera.GetOverwrite2D() == 0);
+  step.file = std::move(claim.file);
+  if (!claim.warning.empty()) step.warnings.push_back(std::move(claim.warning));
   if (Locked(step.file)) {
     step.outcome = BuildStep::Outcome::Locked;
     return;  // skipped: no save and no progress report
@@ -131,12 +109,17 @@ void Build2DBatch::Generate(const HRCamera& camera, std::string view, std::strin
              camera.GetPreserveWalls(), camera.GetPreserveLayer(), camera.GetPreserveLayerIndex());
   step.outcome = saved ? BuildStep::Outcome::Saved : BuildStep::Outcome::Failed;
   if (saved) ++position_;
-  if (progress_) {
-    const std::string status = std::string(resources::LoadString(resources::kIdsFile)) + " " +
-                               std::to_string(position_) + " " + std::string(resources::LoadString(resources::kIdsOf)) +
-                               " " + std::to_string(upper_);
-    progress_({position_, upper_, status, &step});
-  }
+  Report(step);
+}
+
+// The progress step after a save or a refusal: the bar moves on success only, the status line
+// always.
+void Build2DBatch::Report(const BuildStep& step) {
+  if (!progress_) return;
+  const std::string status = std::string(resources::LoadString(resources::kIdsFile)) + " " +
+                             std::to_string(position_) + " " + std::string(resources::LoadString(resources::kIdsOf)) +
+                             " " + std::to_string(upper_);
+  progress_({position_, upper_, status, &step});
 }
 
 void Build2DBatch::CameraPass(const OutputNames& names, BuildResult& result) {
@@ -174,10 +157,14 @@ BuildResult Build2DBatch::Run() {
     result.folderRefused = true;
     return result;
   }
-  const OutputNames names = OutputNamesFor(drawing);
+  OutputNames names = OutputNamesFor(drawing);
+  drawingFolder_ = std::filesystem::path(drawing).parent_path().string();
+  if (!outputParent_.empty()) names.folder = (std::filesystem::path(outputParent_) / "2D_").string();
   result.folder = names.folder;
+  claims_ = OutputFileClaims();
+  // Only the 2D folder itself is made: a folder above it that is missing is a mistyped path.
   std::error_code error;
-  std::filesystem::create_directories(names.folder, error);
+  std::filesystem::create_directory(names.folder, error);
   if (!std::filesystem::is_directory(names.folder, error)) {
     result.folderRefused = true;
     return result;

@@ -7,6 +7,7 @@
 #include <string>
 #include <vector>
 
+#include "display/output_names.h"
 #include "shell/host/host_types.h"
 
 class HRCamera;
@@ -21,6 +22,8 @@ struct BuildStep {
   std::string view;  // camera name, or section or plan name and camera name
   std::string file;  // output name without extension
   Outcome outcome = Outcome::Saved;
+  std::string reason;                 // why a failed view was not saved, when known
+  std::vector<std::string> warnings;  // what the user should know although the view was handled
 };
 
 // Reported after every view: the bar's position and upper bound and the "File n of m" line.
@@ -40,22 +43,15 @@ struct BuildResult {
   bool AllSaved() const { return !folderRefused && Saved() == total; }
 };
 
-// The 2D folder and file prefix of a drawing: beside the drawing, "2D_"; the drawing's name and
-// "_".
-struct OutputNames {
-  std::string folder;
-  std::string prefix;
-};
-OutputNames OutputNamesFor(const std::string& drawingPath);
-// A default output file inside the folder; the name parts cannot leave the folder whatever
-// they hold.
-std::string DefaultOutputFile(const OutputNames& names, const std::string& viewName);
-
 class Build2DBatch {
  public:
   Build2DBatch(BuildMode mode, std::vector<host::EntityHandle> sections, std::vector<host::EntityHandle> plans);
 
   void OnProgress(std::function<void(const BuildProgress&)> callback) { progress_ = std::move(callback); }
+  // The folder that receives the 2D folder, in place of the drawing's own folder.
+  void SetOutputParent(std::string folder) { outputParent_ = std::move(folder); }
+  // Lets cameras' own 2D file names lead anywhere (see OwnOutputFile).
+  void AllowOwnFilesAnywhere(bool allow) { ownFilesAnywhere_ = allow; }
   // Views ticked for 2D in this mode.
   std::int32_t Count() const;
   BuildResult Run();
@@ -74,6 +70,12 @@ class Build2DBatch {
   std::vector<host::EntityHandle> sections_;
   std::vector<host::EntityHandle> plans_;
   std::function<void(const BuildProgress&)> progress_;
+  void Report(const BuildStep& step);
+
+  std::string outputParent_;
+  bool ownFilesAnywhere_ = false;
+  std::string drawingFolder_;
+  OutputFileClaims claims_;
   std::int32_t position_ = 0;
   std::int32_t upper_ = 0;
 };

@@ -22,7 +22,7 @@
 #include "workbench/drawing_file_check.h"
 #include "workbench/drawing_file_database.h"
 #include "workbench/drawing_file_format.h"
-#include "workbench/drawing_file_replace.h"
+#include "workbench/file_replacement.h"
 
 namespace wb {
 namespace {
@@ -37,6 +37,7 @@ std::string Message(Reason reason, const std::string& path, const std::string& d
     case Reason::Damaged: return "drawing file is damaged: " + path + inBrackets;
     case Reason::NewerVersion: return "drawing file is from a newer version of Pandex: " + path + inBrackets;
     case Reason::CannotWrite: return "cannot write " + path + ": " + detail;
+    case Reason::InUse: return "drawing file " + path + " is in use by another program" + inBrackets;
   }
   return detail;
 }
@@ -148,6 +149,19 @@ void CheckFileHeader(const OpenedFile& file, const std::filesystem::path& path) 
   if (size != expectedSize) Refuse(Reason::Damaged, path, "its size does not match its header");
 }
 
+// The file at the end of a chain of symbolic links: a save replaces that file and keeps the
+// links, so that editing through a link changes the drawing it leads to.
+std::filesystem::path FileBehindLinks(const std::filesystem::path& path) {
+  constexpr int kMostLinks = 40;  // as the system itself follows
+  std::filesystem::path current = path;
+  for (int links = 0; std::filesystem::is_symlink(std::filesystem::symlink_status(current)); ++links) {
+    if (links == kMostLinks) throw std::system_error(ELOOP, std::generic_category(), "following its links");
+    const std::filesystem::path next = std::filesystem::read_symlink(current);
+    current = next.is_absolute() ? next : current.parent_path() / next;
+  }
+  return current;
+}
+
 }  // namespace
 
 void SaveDrawingFile(const Drawing& drawing, const std::filesystem::path& path) {
@@ -156,7 +170,7 @@ void SaveDrawingFile(const Drawing& drawing, const std::filesystem::path& path) 
     Refuse(Reason::CannotWrite, path, "the drawing does not hold together: " + *problem);
   }
   try {
-    drawing_file::FileReplacement replacement(path);
+    FileReplacement replacement(FileBehindLinks(path), {".saving", true});
     drawing_file::WriteDrawingDatabase(drawing, replacement.TemporaryPath());
     replacement.Commit();
   } catch (const std::runtime_error& error) {  // system, SQLite and content errors alike

@@ -19,6 +19,7 @@ class DrawingFileError : public std::runtime_error {
     Damaged,       // a drawing file whose content does not hold together
     NewerVersion,  // written by a later Pandex in a format this one does not know
     CannotWrite,   // the save failed; the previous file is untouched
+    InUse,         // another program holds the drawing locked (see DrawingFileLock)
   };
 
   DrawingFileError(Reason reason, const std::string& message) : std::runtime_error(message), reason_(reason) {}
@@ -29,7 +30,8 @@ class DrawingFileError : public std::runtime_error {
 };
 
 // Replaces the file atomically: after a crash at any moment the path holds either the previous
-// drawing or this one, and the previous version stays beside it as "<name>.bak". Refuses
+// drawing or this one, and the previous version stays beside it as "<name>.bak". A path that is
+// a symbolic link saves to the file the link leads to (its backup beside that file). Refuses
 // (CannotWrite) a drawing that OpenDrawingFile would refuse, so every saved file opens again.
 void SaveDrawingFile(const Drawing& drawing, const std::filesystem::path& path);
 

@@ -108,10 +108,14 @@ host::Status MergeSources() {
   if (sources.empty() || state.sourceTarget.empty()) return 0;
   const bool replace = OverwriteTarget();
   state.lastMergeReplaced = replace;
+  state.lastMerge.reset();
   try {
-    draft::Sheet merged = std::move(sources.front());
-    for (std::size_t i = 1; i < sources.size(); ++i) merged = draft::MergeSheets(merged, sources[i]);
-    draft::WriteSheetFiles(merged, state.sourceTarget, replace);
+    Output2DState::Merge merge{state.sourceTarget, std::move(sources.front()), std::nullopt};
+    for (std::size_t i = 1; i < sources.size(); ++i) merge.added = draft::MergeSheets(merge.added, sources[i]);
+    // An empty drawing is what a view that failed to come out looks like; it is never saved.
+    if (merge.added.strokes.empty() && merge.added.labels.empty()) return 0;
+    draft::WriteSheetFiles(merge.added, merge.target, replace, &merge.before);
+    state.lastMerge = std::move(merge);
   } catch (const std::exception&) {
     return 0;  // the old files stay as they were
   }
@@ -119,15 +123,29 @@ host::Status MergeSources() {
   return host::kOk;
 }
 
+// Clips the target to the view's window. After a merge into it, only what the merge added is
+// clipped: what the file held before belongs to other views and their windows.
 host::Status AutoClip() {
   const std::string target = LongName(kTargetKind);
+  std::optional<Output2DState::Merge> merge = std::move(State().lastMerge);
+  State().lastMerge.reset();
   const std::filesystem::path dxf = target + ".dxf";
   std::error_code error;
   if (target.empty() || !std::filesystem::exists(dxf, error)) return 0;
   try {
-    draft::Sheet sheet = draft::ReadDxfSheet(dxf);
     const std::array<double, 4>& window = Workbench::Get().View().window;
-    draft::ClipToWindow(sheet, draft::Box2{{window[0], window[1]}, {window[2], window[3]}});
+    const draft::Box2 box{{window[0], window[1]}, {window[2], window[3]}};
+    draft::Sheet sheet;
+    if (merge && merge->target == target) {
+      sheet = std::move(merge->added);
+      draft::ClipToWindow(sheet, box);
+      if (merge->before) sheet = draft::MergeSheets(*merge->before, sheet);
+    } else {
+      sheet = draft::ReadDxfSheet(dxf);
+      draft::ClipToWindow(sheet, box);
+    }
+    // A window beside the drawing would leave an empty file; the drawing stays unclipped.
+    if (sheet.strokes.empty() && sheet.labels.empty()) return 0;
     draft::WriteSheetFiles(sheet, target, true);
   } catch (const std::exception&) {
     return 0;

@@ -27,6 +27,14 @@ struct Output2DState {
   std::string sourceTarget;                       // where those sources go
   std::filesystem::path specialFolder;            // the host's folder for its own work files
   int mergesWritten = 0;
+  // The last merge: its target, what it added and what the target held before (nothing when
+  // it replaced the target), so that a clip after it cuts only what was added.
+  struct Merge {
+    std::string target;
+    draft::Sheet added;
+    std::optional<draft::Sheet> before;
+  };
+  std::optional<Merge> lastMerge;
   // How the last clean-up and the last merge were asked to work, as the host log would show:
   // the clean-up code (1 coincident lines, 2 merge, -1 none ran) and its tolerance, and
   // whether the merge replaced its target or added to it.

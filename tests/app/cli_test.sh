@@ -19,7 +19,7 @@ check() {  # check NAME EXPECTED_EXIT PATTERN -- COMMAND...
 check help 0 'info' -- "$pandex" --help
 check info-help 0 'DRAWING' -- "$pandex" info --help
 check sample-help 0 'OUTPUT' -- "$pandex" sample --help
-check no-command 106 'subcommand' -- "$pandex"
+check no-command 2 '^pandex: .*subcommand.*\(see pandex --help\)$' -- "$pandex"
 check builtin-sample 0 '^Drawing: sample' -- "$pandex" info
 check write-sample 0 'Wrote the sample drawing' -- "$pandex" sample "$work/sample.pdx"
 check info-saved 0 '^Drawing: sample' -- "$pandex" info "$work/sample.pdx"
@@ -27,6 +27,9 @@ check missing-file 1 '^pandex: .+' -- "$pandex" info "$work/none.pdx"
 printf 'not a drawing at all\n' >"$work/foreign.pdx"
 check foreign-file 1 '^pandex: .+' -- "$pandex" info "$work/foreign.pdx"
 check unwritable 1 '^pandex: .+' -- "$pandex" sample "$work/no/such/folder/x.pdx"
+check sample-keeps-existing 1 '^pandex: .*sample\.pdx exists; add --force to replace it$' -- "$pandex" sample "$work/sample.pdx"
+check sample-force 0 'Wrote the sample drawing' -- "$pandex" sample "$work/sample.pdx" --force
+check sample-force-backup 0 '^backup$' -- bash -c "[ -f '$work/sample.pdx.bak' ] && echo backup"
 # 2D output: the sample's batch into a scratch folder, ticks, a new camera, and refusals.
 count_dxf() { find "$1" -maxdepth 1 -name '*.dxf' | wc -l; }
 absent() { [ ! -e "$1" ] && echo absent; }
@@ -52,9 +55,41 @@ check add-camera-no-direction 1 '^pandex: the eye and the target must differ' --
   "$pandex" add-camera "$work/views.pdx" Flat --eye 1 1 1 --target 1 1 1
 check add-camera-not-a-number 1 '^pandex: the eye and the target must be numbers' -- \
   "$pandex" add-camera "$work/views.pdx" Odd --eye nan 1 1 --target 1 1 1
-check add-camera-no-target 106 'target is required' -- "$pandex" add-camera "$work/views.pdx" N --eye 1 2 3
-check build-2d-bad-mode 105 'bogus not in' -- "$pandex" build-2d --mode bogus
+check add-camera-no-target 2 '^pandex: .*target is required' -- "$pandex" add-camera "$work/views.pdx" N --eye 1 2 3
+check build-2d-bad-mode 2 '^pandex: .*bogus not in' -- "$pandex" build-2d --mode bogus
 check build-2d-missing 1 '^pandex: .+none\.pdx' -- "$pandex" build-2d "$work/none.pdx"
+check build-2d-empty-name 2 '^pandex: .*empty name' -- "$pandex" build-2d ""
+check build-2d-output-dir 0 '^3 of 3 views saved to .*/elsewhere/2D_$' -- \
+  "$pandex" build-2d "$work/views.pdx" --mode cameras --output-dir "$work/elsewhere"
+check build-2d-output-dir-files 0 '^3$' -- count_dxf "$work/elsewhere/2D_"
+check build-2d-no-deep-tree 1 '^pandex: the output folder .*/not/there cannot be made: .*/not does not exist$' -- \
+  "$pandex" build-2d --output-dir "$work/not/there"
+check build-2d-no-deep-tree-made 0 '^absent$' -- absent "$work/not"
+# A new run sweeps away what killed writes of earlier runs left in the 2D folder.
+: >"$work/2D_/.views_North.dxf.0123456789abcdef.tmp"
+"$pandex" build-2d "$work/views.pdx" --mode plans >/dev/null
+check build-2d-sweeps-leftovers 0 '^absent$' -- absent "$work/2D_/.views_North.dxf.0123456789abcdef.tmp"
+# Views whose files would collide are written apart, with a warning.
+"$pandex" add-camera "$work/views.pdx" "a/b" --eye 5 30 5 --target 5 4 2 >/dev/null
+"$pandex" add-camera "$work/views.pdx" "a_b" --eye 5 -30 5 --target 5 4 2 >/dev/null
+check build-2d-collision 0 '^pandex: warning: a_b: its file views_a_b is also the file of "a/b"; written as views_a_b~2' \
+  -- "$pandex" build-2d "$work/views.pdx" --mode cameras
+check build-2d-collision-files 0 'a_b: .*/2D_/views_a_b~2\.dxf, \.svg \(saved\)' -- \
+  "$pandex" build-2d "$work/views.pdx" --mode cameras
+# Editing through a link changes the drawing it leads to and leaves the link.
+mkdir "$work/real" && "$pandex" sample "$work/real/linked.pdx" >/dev/null && ln -s real/linked.pdx "$work/link.pdx"
+"$pandex" add-camera "$work/link.pdx" Linked --eye 1 2 3 --target 0 0 0 >/dev/null
+check edit-through-link 0 '\[x\] Linked ' -- "$pandex" info "$work/real/linked.pdx"
+check link-kept 0 '^link$' -- bash -c "[ -L '$work/link.pdx' ] && echo link"
+# Two editors at once: each waits for the other, and both cameras are kept.
+"$pandex" sample "$work/busy.pdx" >/dev/null
+for pair in 1 2 3 4 5 6 7 8; do
+  "$pandex" add-camera "$work/busy.pdx" "P$pair" --eye 1 2 3 --target 0 0 0 >/dev/null &
+  "$pandex" add-camera "$work/busy.pdx" "Q$pair" --eye 1 2 3 --target 0 0 0 >/dev/null &
+  wait
+done
+added_cameras() { "$pandex" info "$1" | grep -cE '^  \[x\] [PQ][1-8] '; }
+check concurrent-edits-keep-both 0 '^16$' -- added_cameras "$work/busy.pdx"
 mkdir "$work/blocked" && cp "$work/views.pdx" "$work/blocked/views.pdx" && : >"$work/blocked/2D_"
 check build-2d-no-folder 1 '^pandex: Cannot create 2D folder\. \(.*/blocked/2D_\)' -- \
   "$pandex" build-2d "$work/blocked/views.pdx"

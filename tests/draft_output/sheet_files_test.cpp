@@ -2,7 +2,10 @@
 #include "workbench/draft/sheet_files.h"
 
 #include <gtest/gtest.h>
+#include <fcntl.h>
+#include <sys/file.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <fstream>
 #include <limits>
@@ -97,6 +100,33 @@ TEST_F(SheetFiles, AFailedWriteLeavesTheOldFiles) {
   std::filesystem::create_directory(svg_);
   std::ofstream(svg_ / "inside") << "keeps the folder from being empty";
   ExpectRefused(second_, target_, true, "cannot replace " + svg_.string());
+}
+
+TEST_F(SheetFiles, LeftoversOfKilledWritesAreSweptButNotThoseOfRunningOnes) {
+  const std::vector<std::string> leftovers = {".plan.dxf.0123456789abcdef.tmp", ".other.svg.fedcba9876543210.tmp",
+                                              ".other.dxf.00000000000000aa.tmp", ".notes.0123.tmp", "keep.tmp"};
+  for (const std::string& name : leftovers) drawing_file_samples::WriteBytes(folder_ / name, {'x'});
+  // A write still running in another process holds the lock on its temporary.
+  const int running = open((folder_ / leftovers[2]).c_str(), O_RDONLY);
+  ASSERT_GE(running, 0);
+  ASSERT_EQ(flock(running, LOCK_EX), 0);
+  // Writing a target clears its own leftovers; a new run clears the whole folder's.
+  WriteSheetFiles(second_, target_, true);
+  EXPECT_EQ(folder_.Names(), (std::vector<std::string>{leftovers[3], leftovers[2], leftovers[1], "keep.tmp",
+                                                       "plan.dxf", "plan.svg"}));
+  RemoveStaleSheetTemporaries(folder_.Path());
+  EXPECT_EQ(folder_.Names(),
+            (std::vector<std::string>{leftovers[3], leftovers[2], "keep.tmp", "plan.dxf", "plan.svg"}));
+  close(running);
+}
+
+TEST(SheetFileNames, TargetsAsLongAsAFileNameCanBeAreWrittenAndMergedInto) {
+  drawing_file_samples::ScratchFolder folder;
+  const std::filesystem::path target = folder / std::string(251, 'n');
+  WriteSheetFiles(OneStroke(0, "Walls", 0.0), target, true);
+  WriteSheetFiles(OneStroke(0, "Walls", 1.0), target, false);
+  EXPECT_EQ(ReadDxfSheet(DxfPathOf(target)).strokes.size(), 2U);
+  EXPECT_EQ(folder.Names(), (std::vector<std::string>{std::string(251, 'n') + ".dxf", std::string(251, 'n') + ".svg"}));
 }
 
 // Layers meet by the name the file shows; a moved layer keeps its name, even a default one.

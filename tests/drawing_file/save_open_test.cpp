@@ -116,6 +116,51 @@ TEST(DrawingFileSaveOpen, LeftoversOfKilledSavesAreClearedButNotThoseOfRunningOn
   EXPECT_EQ(folder.Names(), (Names{leftovers[0], leftovers[3], "plan.pdx", "plan.pdx.bak"}));
 }
 
+TEST(DrawingFileSaveOpen, NamesUpToTheLongestTheFileSystemTakesSaveWithTheirBackups) {
+  drawing_file_samples::ScratchFolder folder;
+  const std::string twoBytes = "\xC3\xA9";  // e acute
+  for (const std::size_t length : {231U, 243U, 255U}) {
+    SCOPED_TRACE(length);
+    std::string name;
+    while (name.size() + twoBytes.size() + 4 <= length) name += twoBytes;
+    name = std::string(length - 4 - name.size(), 'p') + name + ".pdx";
+    ASSERT_EQ(name.size(), length);
+    wb::SaveDrawingFile(MakeBulkDrawing(10, 1), folder / name);
+    wb::SaveDrawingFile(MakeBulkDrawing(20, 2), folder / name);
+    EXPECT_EQ(wb::OpenDrawingFile(folder / name), MakeBulkDrawing(20, 2));
+    // The backup keeps as much of the name as fits, in whole characters.
+    std::string backup = name.substr(0, std::min<std::size_t>(name.size(), 251));
+    if ((static_cast<unsigned char>(backup.back()) & 0xC0) == 0xC0) backup.pop_back();
+    EXPECT_EQ(wb::OpenDrawingFile(folder / (backup + ".bak")), MakeBulkDrawing(10, 1));
+    EXPECT_EQ(folder.Names().size(), 2U);
+    for (const std::string& left : folder.Names()) std::filesystem::remove(folder / left);
+  }
+}
+
+TEST(DrawingFileSaveOpen, SavingThroughLinksChangesTheDrawingTheyLeadToAndKeepsTheLinks) {
+  drawing_file_samples::ScratchFolder folder;
+  std::filesystem::create_directory(folder / "real");
+  wb::SaveDrawingFile(MakeBulkDrawing(10, 1), folder / "real" / "plan.pdx");
+  // A relative link in another folder, and a link to that link.
+  std::filesystem::create_directory(folder / "links");
+  std::filesystem::create_symlink("../real/plan.pdx", folder / "links" / "plan.pdx");
+  std::filesystem::create_symlink(folder / "links" / "plan.pdx", folder / "shortcut.pdx");
+  const wb::Drawing changed = MakeBulkDrawing(30, 2);
+  wb::SaveDrawingFile(changed, folder / "shortcut.pdx");
+  EXPECT_TRUE(std::filesystem::is_symlink(folder / "shortcut.pdx"));
+  EXPECT_TRUE(std::filesystem::is_symlink(folder / "links" / "plan.pdx"));
+  EXPECT_EQ(wb::OpenDrawingFile(folder / "real" / "plan.pdx"), changed);
+  EXPECT_EQ(wb::OpenDrawingFile(folder / "real" / "plan.pdx.bak"), MakeBulkDrawing(10, 1));
+  EXPECT_EQ(folder.Names(), (Names{"links", "real", "shortcut.pdx"}));
+  // A link to a drawing not saved yet makes it; a loop of links is refused.
+  std::filesystem::create_symlink("real/new.pdx", folder / "ahead.pdx");
+  wb::SaveDrawingFile(changed, folder / "ahead.pdx");
+  EXPECT_EQ(wb::OpenDrawingFile(folder / "real" / "new.pdx"), changed);
+  std::filesystem::create_symlink("loop.pdx", folder / "loop.pdx");
+  EXPECT_THROW(wb::SaveDrawingFile(changed, folder / "loop.pdx"), wb::DrawingFileError);
+  EXPECT_TRUE(std::filesystem::is_symlink(folder / "loop.pdx"));
+}
+
 TEST(DrawingFileSaveOpen, PlacesThatCannotTakeAFileAreLeftAsTheyWere) {
   drawing_file_samples::ScratchFolder folder;
   std::filesystem::create_directory(folder / "taken.pdx");

@@ -104,6 +104,7 @@ TEST_F(BuildBatchTest, ModesWalkTheirOwnViewsAndAllTakesCamerasThenSectionsThenP
 }
 
 TEST_F(BuildBatchTest, CameraWithItsOwnFileNameIsSavedThereNotInTheFolder) {
+  AddCube();
   std::filesystem::create_directory(Folder() / "elsewhere");
   const std::string own = (Folder() / "elsewhere" / "front elevation").string();
   AddCamera("Front", kFront, true, own);
@@ -115,7 +116,40 @@ TEST_F(BuildBatchTest, CameraWithItsOwnFileNameIsSavedThereNotInTheFolder) {
   EXPECT_EQ(Names(OutputFolder()), (Strings{"house_Plain.dxf", "house_Plain.svg"}));
 }
 
+TEST_F(BuildBatchTest, OwnFileNamesAreTakenFromTheDrawingsFolderAndMayNotLeaveIt) {
+  AddCube();
+  const std::filesystem::path job = Folder() / "job";
+  std::filesystem::create_directories(job / "sub");
+  std::filesystem::create_directory(Folder() / "outside");
+  std::filesystem::create_directory_symlink(Folder() / "outside", job / "link");
+  Bench().SetDrawingPath(Bench().Current(), (job / "house.pdx").string());
+  const Strings own = {"sub/front", "../outside/escaped", (Folder() / "outside" / "absolute").string(),
+                       "link/through", "bell\a", (job / "sub" / "absolute").string()};
+  for (std::size_t i = 0; i < own.size(); ++i) AddCamera("C" + std::to_string(i), kFront, true, own[i]);
+
+  const BuildResult refused = Run(BuildMode::Cameras);
+  EXPECT_EQ(Each(refused, &BuildStep::outcome), (std::vector{Outcome::Saved, Outcome::Failed, Outcome::Failed,
+                                                             Outcome::Failed, Outcome::Failed, Outcome::Saved}));
+  EXPECT_EQ(refused.steps[0].file, (job / "sub" / "front").string()) << "from the drawing's folder, not the process's";
+  EXPECT_EQ(refused.steps[1].reason, "its own 2D file " + (Folder() / "outside" / "escaped").string() +
+                                         " lies outside the drawing's folder " + job.string());
+  EXPECT_EQ(refused.steps[4].reason, "its own 2D file name holds control characters");
+  EXPECT_TRUE(std::filesystem::is_empty(Folder() / "outside")) << "nothing written where a refused name leads";
+  EXPECT_EQ(reports_.size(), own.size()) << "a refused view still reports its step";
+
+  HRUtility::Build2DBatch anywhere(BuildMode::Cameras, {}, {});
+  anywhere.AllowOwnFilesAnywhere(true);
+  EXPECT_TRUE(anywhere.Run().AllSaved());
+  EXPECT_TRUE(std::filesystem::exists(Folder() / "outside" / "escaped.dxf"));
+  EXPECT_TRUE(std::filesystem::exists(job / "link" / "through.dxf"));
+  // The camera keeps its name as the user gave it.
+  HRCamera camera;
+  ASSERT_EQ(LoadGeneralCamera(camera, 1), 0);
+  EXPECT_EQ(camera.Get2DFile(), "../outside/escaped");
+}
+
 TEST_F(BuildBatchTest, HostileViewNamesStayInsideTheFolderAsValidFileNames) {
+  AddCube();
   std::string accents;
   for (int i = 0; i < 300; ++i) accents += "\xC3\xA9";  // e acute, two bytes
   const Strings names = {"../x", "a/b", "..", ".", "back\\slash:colon*star?query\"<>|", "tab\tbell\a\x7f" "end",
@@ -134,7 +168,7 @@ TEST_F(BuildBatchTest, HostileViewNamesStayInsideTheFolderAsValidFileNames) {
     const std::string name = std::filesystem::path(step.file).filename();
     EXPECT_EQ(std::filesystem::path(step.file).parent_path(), OutputFolder()) << step.view;
     EXPECT_TRUE(std::filesystem::is_regular_file(step.file + ".dxf")) << step.view;
-    EXPECT_LE(name.size(), 200U) << "room for an extension and a temporary suffix";
+    EXPECT_LE(name.size() + 4, 255U) << "cut only as far as the extension needs";
     EXPECT_TRUE(std::ranges::none_of(name, forbidden)) << name;
   }
   // A long name is cut between characters, not inside one.
@@ -142,6 +176,52 @@ TEST_F(BuildBatchTest, HostileViewNamesStayInsideTheFolderAsValidFileNames) {
   EXPECT_EQ(cut.size() % 2, 0U) << "house_ and whole characters only";
   // With no prefix at all, a name still cannot turn into a folder.
   EXPECT_EQ(HRUtility::DefaultOutputFile({"/jobs/2D_", ""}, ".."), "/jobs/2D_/_..");
+}
+
+TEST_F(BuildBatchTest, ViewsWhoseFilesWouldCollideWriteDistinctFilesWithAWarning) {
+  AddCube();
+  const auto add = [](const std::string& name, const std::string& file, std::uint8_t overwrite) {
+    CameraSettings settings = SettingsFor(kFront);
+    settings.file2D = file;
+    settings.overwrite2D = overwrite;
+    HRCamera camera;
+    camera.SetSettings(settings);
+    camera.SetName(name);
+    camera.SetFor2D(1);
+    ASSERT_GE(AddGeneralCamera(camera), 0);
+  };
+  const std::string longName(400, 'L');
+  // Equal once '/' is replaced, equal without regard to case, equal once cut to fit.
+  for (const std::string& name : {std::string("a/b"), std::string("a_b"), std::string("A_B"), longName + "1",
+                                  longName + "2", std::string("Plain")}) {
+    add(name, "", 1);
+  }
+  // A camera's own file that replaces what it names is told apart; one that adds to it shares it.
+  const std::string plain = (OutputFolder() / "house_Plain").string();
+  add("Own", plain, 1);
+  add("Adds", plain, 0);
+
+  const BuildResult result = Run(BuildMode::Cameras);
+  EXPECT_TRUE(result.AllSaved());
+  Strings files, warned;
+  for (const BuildStep& step : result.steps) {
+    files.push_back(std::filesystem::path(step.file).filename());
+    if (!step.warnings.empty()) warned.push_back(step.view);
+  }
+  const std::string cut = "house_" + std::string(251 - 6, 'L');
+  const std::string cutForSuffix = "house_" + std::string(251 - 6 - 2, 'L');
+  EXPECT_EQ(files, (Strings{"house_a_b", "house_a_b~2", "house_A_B~3", cut, cutForSuffix + "~2", "house_Plain",
+                            "house_Plain~2", "house_Plain"}));
+  EXPECT_EQ(warned, (Strings{"a_b", "A_B", longName + "2", "Own"}));
+  EXPECT_EQ(result.steps[1].warnings.at(0),
+            "its file house_a_b is also the file of \"a/b\"; written as house_a_b~2 instead");
+  // Every file holds one view's drawing, but the one shared on purpose holds two.
+  const auto strokes = [&](const std::string& file) {
+    return wb::draft::ReadDxfSheet(OutputFolder() / (file + ".dxf")).strokes.size();
+  };
+  const std::size_t one = strokes("house_a_b");
+  ASSERT_GT(one, 0U);
+  for (const std::string& file : files) EXPECT_EQ(strokes(file), file == "house_Plain" ? 2 * one : one) << file;
 }
 
 TEST_F(BuildBatchTest, PlanPassHandsTheNameOverInTheCharacterBlockAndNeverPastIt) {

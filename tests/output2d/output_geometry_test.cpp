@@ -134,6 +134,14 @@ TEST_F(OutputGeometryTest, AutoClipCutsTheDrawingToTheViewWindow) {
   const std::vector<Expected> clipped = {{{-1.0, 0.0}, {2.0, 0.0}}};
   EXPECT_TRUE(draft_test::SameStrokes(SaveAndRead(windowed, {.autoClip = 1}).strokes, clipped, kTolerance));
   EXPECT_EQ(SaveAndRead(windowed, {.autoClip = 0}).strokes.size(), 2U);
+  // Merged into what an earlier view left, only the new drawing is clipped.
+  const Sheet merged = SaveAndRead(windowed, {.autoClip = 1, .overwrite = 0});
+  EXPECT_TRUE(draft_test::SameStrokes(merged.strokes,
+                                      {{{-5.0, 0.0}, {5.0, 0.0}}, {{-5.0, 3.0}, {5.0, 3.0}}, {{-1.0, 0.0}, {2.0, 0.0}}},
+                                      kTolerance));
+  // A window beside everything leaves the drawing unclipped rather than empty.
+  windowed.window = {50.0, 50.0, 60.0, 60.0};
+  EXPECT_EQ(SaveAndRead(windowed, {.autoClip = 1}).strokes.size(), 2U);
 }
 
 }  // namespace

@@ -41,6 +41,7 @@ class Save2DTest : public Output2DTest {
 };
 
 TEST_F(Save2DTest, WithoutPreserveNothingIsSelectedExtractedOrBlanked) {
+  AddCube();
   Show(kGeometric);
   globr[41] = 2.0F;
   Bench().GetJournal().Clear();
@@ -94,6 +95,7 @@ TEST_F(Save2DTest, SolidModesPreserveNothingAndRemoveHiddenLines) {
 }
 
 TEST_F(Save2DTest, CleanupCodeFollowsTheTwoFlagsAndIsPutBack) {
+  AddCube();
   Show(kGeometric);
   // Coincident removal and line merging, and the code that runs (-1: no clean-up runs).
   for (const auto [removeCoincident, lineMerge, code] : {std::array{1, 0, 1}, {0, 1, 2}, {1, 1, 3}, {0, 0, -1}}) {
@@ -119,6 +121,7 @@ TEST_F(Save2DTest, RewriteSwitchHoldsOnlyDuringTheMergeAndIsAlwaysWrittenBack) {
     bool writtenBeforeMerge;
     std::string after;
   };
+  AddCube();
   Show(kGeometric);
   for (const Case& c : {Case{nullptr, 0, true, "1"}, Case{nullptr, 1, false, "1"}, Case{"1", 1, false, "1"},
                         Case{"0", 0, false, "0"}, Case{"0", 1, true, "0"}, Case{"0.6", 1, false, "1"}}) {
@@ -146,6 +149,19 @@ TEST_F(Save2DTest, RewriteSwitchHoldsOnlyDuringTheMergeAndIsAlwaysWrittenBack) {
   EXPECT_EQ(Symbol(), "0");
   EXPECT_EQ(globr[41], 2.0F);
   EXPECT_FALSE(std::filesystem::exists(Folder() / "failed.dxf"));
+}
+
+TEST_F(Save2DTest, AViewThatComesOutEmptyIsNotSavedAndLeavesTheOldFiles) {
+  AddCube();
+  const std::filesystem::path dxf = Target().string() + ".dxf";
+  drawing_file_samples::WriteBytes(dxf, {'o', 'l', 'd'});
+  // Looking away from the only solid, in each merge mode.
+  Show({{0.5F, -10.0F, 0.5F}, {0.5F, -20.0F, 0.5F}, true});
+  for (const std::uint8_t overwrite : {std::uint8_t{1}, std::uint8_t{0}}) {
+    EXPECT_FALSE(Save(Target(), {.overwrite = overwrite}));
+    EXPECT_EQ(drawing_file_samples::ReadBytes(dxf), (std::vector<std::uint8_t>{'o', 'l', 'd'}));
+    EXPECT_FALSE(std::filesystem::exists(Target().string() + ".svg"));
+  }
 }
 
 TEST_F(Save2DTest, LockedTargetIsRefusedBeforeAnyTwoDCommand) {

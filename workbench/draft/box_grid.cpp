@@ -1,8 +1,10 @@
-// Building the box grid: counted first, then filled, into one flat list.
+// Building the box grid: sized within its entry budget, then counted and filled into one flat
+// list.
 #include "workbench/draft/box_grid.h"
 
 #include <algorithm>
 #include <cmath>
+#include <stdexcept>
 
 namespace wb::draft {
 
@@ -24,8 +26,15 @@ int CellIndex(double position, int count) {
 
 }  // namespace
 
+std::uint64_t BoxGrid::EntryBudget(std::size_t boxes) {
+  return std::max<std::uint64_t>(kMinEntryBudget, std::uint64_t{kEntriesPerBox} * boxes);
+}
+
 BoxGrid::BoxGrid(const std::vector<Box2>& boxes) {
   if (boxes.empty()) return;
+  // Entries name their box in 32 bits, and the budget keeps every count within them.
+  static_assert(kMinEntryBudget < UINT32_MAX);
+  if (boxes.size() > UINT32_MAX / kEntriesPerBox) throw std::length_error("too many boxes for one grid");
   bounds_ = boxes.front();
   for (const Box2& box : boxes) {
     bounds_.min = {std::min(bounds_.min.x, box.min.x), std::min(bounds_.min.y, box.min.y)};
@@ -36,10 +45,13 @@ BoxGrid::BoxGrid(const std::vector<Box2>& boxes) {
   const double cells = static_cast<double>(boxes.size());
   const double area = width * height;
   const double cellSize = area > 0.0 ? std::sqrt(area / cells) : std::max(width, height) / cells;
-  columns_ = CellCount(width, cellSize);
-  rows_ = CellCount(height, cellSize);
-  cellWidth_ = width > 0.0 ? width / columns_ : 1.0;
-  cellHeight_ = height > 0.0 ? height / rows_ : 1.0;
+  SetCells(CellCount(width, cellSize), CellCount(height, cellSize));
+  // Many large boxes cover many cells each: tens of thousands of long strokes across the whole
+  // view would list billions of entries. A coarser grid lists fewer; its walks visit more.
+  const std::uint64_t budget = EntryBudget(boxes.size());
+  while (CountEntries(boxes) > budget && (columns_ > 1 || rows_ > 1)) {
+    SetCells(std::max(1, columns_ / 2), std::max(1, rows_ / 2));
+  }
 
   const std::size_t cellTotal = static_cast<std::size_t>(columns_) * static_cast<std::size_t>(rows_);
   cellStart_.assign(cellTotal + 1, 0);
@@ -57,6 +69,25 @@ BoxGrid::BoxGrid(const std::vector<Box2>& boxes) {
   for (std::uint32_t index = 0; index < boxes.size(); ++index) {
     forEachCell(boxes[index], [&](std::size_t cell) { entries_[fill[cell]++] = index; });
   }
+}
+
+void BoxGrid::SetCells(int columns, int rows) {
+  columns_ = columns;
+  rows_ = rows;
+  const double width = bounds_.max.x - bounds_.min.x;
+  const double height = bounds_.max.y - bounds_.min.y;
+  cellWidth_ = width > 0.0 ? width / columns_ : 1.0;
+  cellHeight_ = height > 0.0 ? height / rows_ : 1.0;
+}
+
+std::uint64_t BoxGrid::CountEntries(const std::vector<Box2>& boxes) const {
+  std::uint64_t total = 0;
+  for (const Box2& box : boxes) {
+    const auto columns = static_cast<std::uint64_t>(Column(box.max.x) - Column(box.min.x) + 1);
+    const auto rows = static_cast<std::uint64_t>(Row(box.max.y) - Row(box.min.y) + 1);
+    total += columns * rows;
+  }
+  return total;
 }
 
 int BoxGrid::Column(double x) const { return CellIndex((x - bounds_.min.x) / cellWidth_, columns_); }

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <algorithm>
+#include <cstddef>
 #include <cstdint>
 #include <utility>
 #include <vector>
@@ -14,8 +15,13 @@ namespace wb::draft {
 class BoxGrid {
  public:
   BoxGrid() = default;
-  // About one cell per box keeps both the cell lists and the walk short.
+  // About one cell per box keeps both the cell lists and the walk short; where boxes are so
+  // large that this would list more than EntryBudget entries, the grid is made coarser.
   explicit BoxGrid(const std::vector<Box2>& boxes);
+
+  // The most (box, cell) entries a grid over this many boxes lists.
+  static std::uint64_t EntryBudget(std::size_t boxes);
+  std::size_t EntryCount() const { return entries_.size(); }
 
   // Calls visit(index) for the boxes listed in every cell the segment from a to b, widened by
   // margin, passes; a box in several cells comes once per cell. Stops when visit
@@ -24,6 +30,13 @@ class BoxGrid {
   void ForEachAlong(Point2 a, Point2 b, double margin, Visit visit) const;
 
  private:
+  // 16 M entries (64 MB), or 4 per box where there are more boxes.
+  static constexpr std::uint64_t kMinEntryBudget = std::uint64_t{1} << 24;
+  static constexpr std::uint64_t kEntriesPerBox = 4;
+
+  void SetCells(int columns, int rows);
+  // How many entries the boxes make in the grid as it stands, counted without overflow.
+  std::uint64_t CountEntries(const std::vector<Box2>& boxes) const;
   int Column(double x) const;
   int Row(double y) const;
 

@@ -2,7 +2,10 @@
 // touched, so every failure that can be foreseen happens while the old files are still whole.
 #include "workbench/draft/sheet_files.h"
 
+#include <cerrno>
 #include <map>
+#include <memory>
+#include <optional>
 #include <sstream>
 #include <string>
 #include <system_error>
@@ -11,17 +14,41 @@
 #include "workbench/draft/dxf_reader.h"
 #include "workbench/draft/dxf_writer.h"
 #include "workbench/draft/file_lock.h"
-#include "workbench/draft/pending_file.h"
 #include "workbench/draft/svg_writer.h"
+#include "workbench/file_replacement.h"
 
 namespace wb::draft {
 namespace {
 
+[[noreturn]] void Fail(const std::filesystem::path& path, const char* doing, int error) {
+  throw SheetFileError("cannot " + std::string(doing) + ' ' + path.string() + ": " +
+                       std::generic_category().message(error));
+}
+
 // Renaming a file over a folder fails; found before the first rename, it leaves both old files.
 void RefuseFolderAt(const std::filesystem::path& path) {
   std::error_code ignored;
-  if (std::filesystem::is_directory(std::filesystem::symlink_status(path, ignored))) {
-    FailOnFile(path, "replace", std::make_error_code(std::errc::is_a_directory));
+  if (std::filesystem::is_directory(std::filesystem::symlink_status(path, ignored))) Fail(path, "replace", EISDIR);
+}
+
+constexpr ReplacementStyle kSheetReplacement{".tmp", false};
+
+// The new version of one file, complete and synced under its temporary name.
+std::unique_ptr<FileReplacement> Prepared(const std::filesystem::path& path, std::string_view content) {
+  try {
+    auto file = std::make_unique<FileReplacement>(path, kSheetReplacement);
+    file->Write(content);
+    return file;
+  } catch (const std::system_error& error) {
+    Fail(path, "write", error.code().value());
+  }
+}
+
+void Commit(FileReplacement& file, const std::filesystem::path& path) {
+  try {
+    file.Commit();
+  } catch (const std::system_error& error) {
+    Fail(path, "replace", error.code().value());
   }
 }
 
@@ -35,17 +62,25 @@ std::string Serialize(const SheetWriter& writer, const Sheet& sheet, const std::
   return std::move(out).str();
 }
 
-Sheet SheetToWrite(const Sheet& sheet, const std::filesystem::path& dxfPath, bool overwrite) {
+Sheet SheetToWrite(const Sheet& sheet, const std::filesystem::path& dxfPath, bool overwrite,
+                   std::optional<Sheet>* before) {
   std::error_code error;
   if (overwrite || !std::filesystem::exists(std::filesystem::symlink_status(dxfPath, error))) return sheet;
   try {
-    return MergeSheets(ReadDxfSheet(dxfPath), sheet);
+    Sheet existing = ReadDxfSheet(dxfPath);
+    Sheet merged = MergeSheets(existing, sheet);
+    if (before != nullptr) *before = std::move(existing);
+    return merged;
   } catch (const DxfReadError& problem) {
     throw SheetFileError(std::string("cannot merge into ") + problem.what());
   }
 }
 
 }  // namespace
+
+void RemoveStaleSheetTemporaries(const std::filesystem::path& folder) {
+  RemoveStaleTemporaries(folder, kSheetReplacement.suffix);
+}
 
 std::filesystem::path DxfPathOf(const std::filesystem::path& target) {
   std::filesystem::path path = target;
@@ -107,7 +142,9 @@ Sheet MergeSheets(const Sheet& existing, const Sheet& added) {
   return merged;
 }
 
-void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bool overwrite) {
+void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bool overwrite,
+                     std::optional<Sheet>* before) {
+  if (before != nullptr) before->reset();
   const std::filesystem::path dxfPath = DxfPathOf(target);
   const std::filesystem::path svgPath = SvgPathOf(target);
   try {
@@ -115,17 +152,16 @@ void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bo
   } catch (const std::system_error& error) {
     throw SheetFileError(error.what());
   }
-  const Sheet content = SheetToWrite(sheet, dxfPath, overwrite);
+  const Sheet content = SheetToWrite(sheet, dxfPath, overwrite, before);
   const std::string dxf = Serialize(DxfWriter(), content, dxfPath);
   const std::string svg = Serialize(SvgWriter(), content, svgPath);
   RefuseFolderAt(dxfPath);
   RefuseFolderAt(svgPath);
-  PendingFile newDxf(dxfPath, dxf);
-  PendingFile newSvg(svgPath, svg);
+  const std::unique_ptr<FileReplacement> newDxf = Prepared(dxfPath, dxf);
+  const std::unique_ptr<FileReplacement> newSvg = Prepared(svgPath, svg);
   // The drawing first: should the preview's rename fail, the drawing is still the newest.
-  newDxf.Commit();
-  newSvg.Commit();
-  SyncFolder(FolderOf(dxfPath));
+  Commit(*newDxf, dxfPath);
+  Commit(*newSvg, svgPath);
 }
 
 }  // namespace wb::draft

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <filesystem>
+#include <optional>
 #include <stdexcept>
 
 #include "workbench/draft/sheet.h"
@@ -14,6 +15,10 @@ class SheetFileError : public std::runtime_error {
  public:
   using std::runtime_error::runtime_error;
 };
+
+// Removes what writes of 2D files that were killed left in the folder: temporaries that no
+// running write holds. Best effort.
+void RemoveStaleSheetTemporaries(const std::filesystem::path& folder);
 
 std::filesystem::path DxfPathOf(const std::filesystem::path& target);
 std::filesystem::path SvgPathOf(const std::filesystem::path& target);
@@ -31,6 +36,8 @@ Sheet MergeSheets(const Sheet& existing, const Sheet& added);
 // so the target holds the old drawing or the new one, never part of one. Throws SheetFileError
 // (the target in use by another user, a folder missing or not writable, an old file that cannot
 // be merged into, a value no file can carry), leaving the old files and no temporary behind.
-void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bool overwrite);
+// When the sheet was merged into an old drawing and `before` is given, it receives that drawing.
+void WriteSheetFiles(const Sheet& sheet, const std::filesystem::path& target, bool overwrite,
+                     std::optional<Sheet>* before = nullptr);
 
 }  // namespace wb::draft
