@@ -59,11 +59,9 @@ void RemoveIfStale(const std::filesystem::path& path) {
 
 FileReplacement::FileReplacement(const std::filesystem::path& target, ReplacementStyle style)
     : target_(std::filesystem::absolute(target)), keepBackup_(style.keepBackup) {
-  const std::filesystem::path folder = target_.parent_path();
-  const std::string prefix = replacement::TemporaryPrefix(target_, style.suffix);
-  replacement::RemoveStaleTemporariesOf(folder, style.suffix, prefix);
+  const replacement::TemporaryNames names(target_, style.suffix);
   for (int attempt = 1; lock_ < 0; ++attempt) {
-    temporary_ = folder / (prefix + replacement::RandomDigits() + std::string(style.suffix));
+    temporary_ = names.Next();
     const int fd = open(temporary_.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
     if (fd < 0 && (errno != EEXIST || attempt == kCreateAttempts)) ThrowErrno("creating a temporary file");
     if (fd < 0) continue;

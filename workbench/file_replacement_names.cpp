@@ -53,21 +53,19 @@ void RemoveStale(const std::filesystem::path& folder, Pick pick) {
 
 }  // namespace
 
-std::string TemporaryPrefix(const std::filesystem::path& target, std::string_view suffix) {
-  const std::size_t room = NameLimit(target.parent_path()) - 2 - kRandomDigits - suffix.size();
-  return '.' + CutTo(target.filename().string(), room) + '.';
+TemporaryNames::TemporaryNames(const std::filesystem::path& target, std::string_view suffix)
+    : folder_(target.parent_path()), suffix_(suffix) {
+  const std::size_t room = NameLimit(folder_) - 2 - kRandomDigits - suffix.size();
+  prefix_ = '.' + CutTo(target.filename().string(), room) + '.';
+  RemoveStale(folder_, [this](std::string_view name) { return IsTemporaryOf(name, suffix_, prefix_); });
 }
 
-std::string RandomDigits() {
+std::filesystem::path TemporaryNames::Next() const {
   std::random_device random;
   const std::uint64_t value = (std::uint64_t{random()} << 32) ^ random();
   char digits[kRandomDigits + 1];
   std::snprintf(digits, sizeof digits, "%016llx", static_cast<unsigned long long>(value));
-  return digits;
-}
-
-void RemoveStaleTemporariesOf(const std::filesystem::path& folder, std::string_view suffix, std::string_view prefix) {
-  RemoveStale(folder, [&](std::string_view name) { return IsTemporaryOf(name, suffix, prefix); });
+  return folder_ / (prefix_ + digits + suffix_);
 }
 
 }  // namespace replacement

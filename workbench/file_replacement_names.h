@@ -14,10 +14,18 @@ std::size_t NameLimit(const std::filesystem::path& folder);
 // Removes the temporary unless a running write holds it (each system tells its own way).
 void RemoveIfStale(const std::filesystem::path& path);
 
-// ".<name>." cut so that the random digits and the suffix still fit in a file name.
-std::string TemporaryPrefix(const std::filesystem::path& target, std::string_view suffix);
-std::string RandomDigits();
-// Removes the stale temporaries of the target whose temporaries start with the prefix.
-void RemoveStaleTemporariesOf(const std::filesystem::path& folder, std::string_view suffix, std::string_view prefix);
+// The names a new temporary of a target may take. Making it removes the stale temporaries of the
+// same target first.
+class TemporaryNames {
+ public:
+  TemporaryNames(const std::filesystem::path& target, std::string_view suffix);
+  // ".<name>.<16 random hex digits><suffix>" in the target's folder, the name cut to fit.
+  std::filesystem::path Next() const;
+
+ private:
+  std::filesystem::path folder_;
+  std::string prefix_;
+  std::string suffix_;
+};
 
 }  // namespace wb::replacement

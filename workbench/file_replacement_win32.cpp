@@ -33,11 +33,9 @@ void RemoveIfStale(const std::filesystem::path& path) { DeleteFileW(path.c_str()
 
 FileReplacement::FileReplacement(const std::filesystem::path& target, ReplacementStyle style)
     : target_(std::filesystem::absolute(target)), keepBackup_(style.keepBackup) {
-  const std::filesystem::path folder = target_.parent_path();
-  const std::string prefix = replacement::TemporaryPrefix(target_, style.suffix);
-  replacement::RemoveStaleTemporariesOf(folder, style.suffix, prefix);
+  const replacement::TemporaryNames names(target_, style.suffix);
   for (int attempt = 1; file_ == nullptr; ++attempt) {
-    temporary_ = folder / (prefix + replacement::RandomDigits() + std::string(style.suffix));
+    temporary_ = names.Next();
     HANDLE file = CreateFileW(temporary_.c_str(), GENERIC_READ | GENERIC_WRITE, 0, nullptr, CREATE_NEW,
                               FILE_ATTRIBUTE_NORMAL, nullptr);
     if (file != INVALID_HANDLE_VALUE) {
