@@ -14,6 +14,7 @@
 #include "app/build_2d_command.h"
 #include "app/drawing_access.h"
 #include "app/drawing_summary.h"
+#include "app/pane_command.h"
 #include "app/plugin_session.h"
 #include "app/view_edit.h"
 #include "app/views_summary.h"
@@ -87,6 +88,8 @@ int main(int argc, char** argv) {
       ->check(CLI::Range(0, 10));
   addCamera->add_flag("--no-tick", noTick, "Do not tick the camera for 2D");
 
+  const app::PaneCommand pane(app, kNamed);
+
   try {
     app.parse(argc, argv);
   } catch (const CLI::Success& done) {  // --help
@@ -98,6 +101,7 @@ int main(int argc, char** argv) {
   }
 
   try {
+    if (pane.Chosen()) return pane.Run(std::cout, std::cerr);
     if (*build2d) {
       static const std::map<std::string, HRUtility::BuildMode> kModes = {{"all", HRUtility::BuildMode::All},
                                                                          {"cameras", HRUtility::BuildMode::Cameras},

@@ -8,6 +8,7 @@
 #include "model/current_database.h"
 #include "resources/resource_module.h"
 #include "shell/host/argument_blocks.h"
+#include "shell/host_messages.h"
 #include "shell/pandex_app.h"
 #include "shell/pane_instance.h"
 #include "shell/plugin_exports.h"
@@ -56,6 +57,7 @@ void LibraryAttach() {
   CreateCameraManager();
   SetCurrentDatabase(db.handle);
   SectionsShown = 0;
+  RegisterHostMessages();
 }
 
 void LibraryDetach() {

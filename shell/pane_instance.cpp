@@ -32,6 +32,10 @@ CPandexDlg* EnsurePane() {
 
 void SetPaneFactory(PaneFactory factory) { Factory() = std::move(factory); }
 
+void ReleasePane(CPandexDlg* released) {
+  if (released == pane.get()) pane.reset();
+}
+
 void DestroyPane() { pane.reset(); }
 
 }  // namespace pandex

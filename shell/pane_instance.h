@@ -18,6 +18,10 @@ CPandexDlg* EnsurePane();
 using PaneFactory = std::function<std::unique_ptr<CPandexDlg>()>;
 void SetPaneFactory(PaneFactory factory);
 
+// A pane whose window was destroyed (its frame closed) deletes itself through this, after its
+// last message; the pointer is cleared, so the next sub-command that needs a pane makes one.
+void ReleasePane(CPandexDlg* pane);
+
 // Unloading releases the pane with the rest of the library's state.
 void DestroyPane();
 

@@ -29,6 +29,7 @@ void Workbench::Reset() {
   memory_.Clear();
   cameraManagerOn_ = false;
   commandLines_.clear();
+  commandLineRunner_ = nullptr;
   output2D_.Reset();
   drawingPaths_.clear();
   // After the blocks are zeroed: view and display publish the values the host keeps in them.
@@ -36,6 +37,11 @@ void Workbench::Reset() {
   view_.Reset();
   display_.Reset();
   SetCurrent(Open(Drawing{}));
+}
+
+void Workbench::AddCommandLine(std::string commandLine) {
+  commandLines_.push_back(commandLine);
+  if (commandLineRunner_) commandLineRunner_(commandLine);
 }
 
 std::string Workbench::DrawingPath(host::DatabaseHandle database) const {

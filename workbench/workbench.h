@@ -5,6 +5,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <map>
 #include <string>
 #include <utility>
@@ -73,7 +74,9 @@ class Workbench {
   // The command lines handed to the host with CommandMessage, in order, for the host (or a
   // scripted user) to run.
   const std::vector<std::string>& CommandLines() const { return commandLines_; }
-  void AddCommandLine(std::string commandLine) { commandLines_.push_back(std::move(commandLine)); }
+  void AddCommandLine(std::string commandLine);
+  // Who runs the command lines as they come (the main frame); without one they are only kept.
+  void SetCommandLineRunner(std::function<void(const std::string&)> runner) { commandLineRunner_ = std::move(runner); }
 
   // Loading runs the library's attach; unloading its detach. Loading a second time first
   // unloads the first.
@@ -109,6 +112,7 @@ class Workbench {
   DisplayState display_;
   LayerTableSnapshot layerTable_;
   std::vector<std::string> commandLines_;
+  std::function<void(const std::string&)> commandLineRunner_;
   Output2DState output2D_;
   std::map<host::DatabaseHandle, std::string> drawingPaths_;
   PluginExports plugin_;

@@ -93,4 +93,28 @@ check concurrent-edits-keep-both 0 '^16$' -- added_cameras "$work/busy.pdx"
 mkdir "$work/blocked" && cp "$work/views.pdx" "$work/blocked/views.pdx" && : >"$work/blocked/2D_"
 check build-2d-no-folder 1 '^pandex: Cannot create 2D folder\. \(.*/blocked/2D_\)' -- \
   "$pandex" build-2d "$work/blocked/views.pdx"
+# The pane command: the README's tour on a saved sample house with a picture after each action,
+# the undocked pane, and one-line errors that name the script's line.
+source_dir=$(cd "$(dirname "$0")/../.." && pwd)
+tour=$source_dir/samples/scripts/tour.pane
+actions=$(grep -cvE '^[[:space:]]*(#|$)' "$tour")
+"$pandex" sample "$work/house.pdx" >/dev/null
+"$pandex" pane "$work/house.pdx" --script "$tour" --render "$work/renders" >"$work/tour.out" 2>&1
+check tour 0 "^Wrote $((actions + 1)) pictures to $work/renders\$" -- cat "$work/tour.out"
+check tour-tree 0 '^  \[x\] Garden$' -- cat "$work/tour.out"
+check tour-saved-line 0 "^Saved the drawing to $work/house.pdx\$" -- cat "$work/tour.out"
+check tour-saved 0 'Garden' -- "$pandex" info "$work/house.pdx"
+check picture 0 'dock-caption' -- cat "$work/renders/000-start.svg"
+if command -v rsvg-convert >/dev/null; then
+  check picture-png 0 '' -- rsvg-convert "$work/renders/009-rename.svg" -o "$work/step.png"
+fi
+printf 'print\n' >"$work/print.pane"
+check undocked 0 '^Cameras:$' -- "$pandex" pane --undocked --script "$work/print.pane"
+printf 'tab cameras\n\nfly away\n' >"$work/unknown.pane"
+check unknown-action 1 "^pandex: $work/unknown.pane: line 3: no action \"fly\"" -- "$pandex" pane --script "$work/unknown.pane"
+printf 'tab plans\nselect Nowhere\n' >"$work/missing.pane"
+check missing-item 1 "^pandex: $work/missing.pane: line 2: no tree item \"Nowhere\"" -- \
+  "$pandex" pane --script "$work/missing.pane"
+check missing-script 1 '^pandex: cannot read the script' -- "$pandex" pane --script "$work/none.pane"
+check pane-empty-drawing 2 '^pandex: .*empty name' -- "$pandex" pane "" --script "$work/print.pane"
 [ "$failures" -eq 0 ]

@@ -195,6 +195,7 @@ TEST_F(EntryTest, APaneWhoseWindowFailsIsKeptAndNotCreatedAgain) {
   Run(6);
   EXPECT_EQ(panesMade, 1);
   EXPECT_NE(pandex::GetPane(), nullptr);
+  EXPECT_FALSE(wb::Workbench::Get().CameraManagerOn()) << "no window was shown";
 }
 
 using LibraryLoadTest = LoadedPluginTest;
