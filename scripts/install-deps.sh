@@ -3,6 +3,8 @@
 set -euo pipefail
 packages=(cmake ninja-build g++ clang libclang-rt-14-dev googletest libgtest-dev libgmock-dev libbenchmark-dev librsvg2-bin
           libsqlite3-dev libxml2-dev libcli11-dev nlohmann-json3-dev python3 python3-ezdxf)
+# Other install scripts name their own packages, and extra apt options in APT_INSTALL_OPTIONS.
+if (($#)); then packages=("$@"); fi
 missing=()
 for package in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$package" 2>/dev/null | grep -q "install ok installed" || missing+=("$package")
@@ -12,5 +14,5 @@ if ((${#missing[@]})); then
   SUDO=""
   [ "$(id -u)" -eq 0 ] || SUDO="sudo"
   $SUDO apt-get update -qq
-  DEBIAN_FRONTEND=noninteractive $SUDO apt-get install -y -qq "${missing[@]}"
+  DEBIAN_FRONTEND=noninteractive $SUDO apt-get install -y -qq ${APT_INSTALL_OPTIONS:-} "${missing[@]}"
 fi

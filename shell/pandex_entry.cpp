@@ -71,10 +71,12 @@ void LibraryDetach() {
 
 }  // namespace pandex
 
-void Pandex() {
+namespace {
+
+void Dispatch(std::int32_t subCommand) {
   using pandex::EnsurePane;
   using pandex::GetPane;
-  switch (globi[0]) {
+  switch (subCommand) {
     case kShowPane:
       if (CPandexDlg* pane = EnsurePane()) pane->ShowPane(true);
       break;
@@ -101,5 +103,16 @@ void Pandex() {
       break;
     default:
       break;
+  }
+}
+
+}  // namespace
+
+void Pandex() {
+  // An exception cannot unwind into the host, which may be built by another compiler: an
+  // operation that fails this way is abandoned and the host carries on.
+  try {
+    Dispatch(globi[0]);
+  } catch (...) {
   }
 }

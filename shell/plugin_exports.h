@@ -2,8 +2,17 @@
 // host's loader sends on attach and detach.
 #pragma once
 
-// The one entry; the sub-command is in globi[0].
-void Pandex();
+// On Windows the entry is the library's one export, under its plain name: a C function with the
+// C calling convention and no arguments, which the host finds by name and calls directly or
+// through its overlay "Pandex".
+#if defined(_WIN32)
+#define PANDEX_EXPORT __declspec(dllexport)
+#else
+#define PANDEX_EXPORT
+#endif
+
+// The one entry; the sub-command is in globi[0]. Nothing is thrown out of it.
+extern "C" PANDEX_EXPORT void Pandex();
 
 namespace pandex {
 

@@ -12,6 +12,7 @@
 #include <cstring>
 #include <exception>
 #include <future>
+#include <limits>
 #include <memory>
 #include <new>
 #include <optional>
@@ -62,13 +63,14 @@ class OpenedFile {
       if (!known) Refuse(Reason::CannotRead, path, ErrorText(error));
       Refuse(Reason::CannotRead, path, S_ISDIR(status.st_mode) ? "it is a folder" : "it is not a regular file");
     }
-    size_ = static_cast<std::size_t>(status.st_size);
+    size_ = static_cast<std::uint64_t>(status.st_size);
   }
   ~OpenedFile() { close(fd_); }
   OpenedFile(const OpenedFile&) = delete;
   OpenedFile& operator=(const OpenedFile&) = delete;
 
-  std::size_t Size() const { return size_; }
+  // In 64 bits on every build: a 32-bit size_t would wrap a file of 4 GiB or more.
+  std::uint64_t Size() const { return size_; }
 
   // Reads `count` bytes from the start; refuses a file that has become shorter meanwhile.
   void ReadStart(unsigned char* bytes, std::size_t count) const {
@@ -86,19 +88,20 @@ class OpenedFile {
   // lock, journal or other side file, and nothing is written to it.
   std::unique_ptr<unsigned char[]> ReadAll() const {
     std::unique_ptr<unsigned char[]> bytes;
+    if (size_ > std::numeric_limits<std::size_t>::max()) Refuse(Reason::CannotRead, path_, "not enough memory");
     try {
-      bytes = std::make_unique_for_overwrite<unsigned char[]>(size_);
+      bytes = std::make_unique_for_overwrite<unsigned char[]>(static_cast<std::size_t>(size_));
     } catch (const std::bad_alloc&) {
       Refuse(Reason::CannotRead, path_, "not enough memory");
     }
-    ReadStart(bytes.get(), size_);
+    ReadStart(bytes.get(), static_cast<std::size_t>(size_));
     return bytes;
   }
 
  private:
   const std::filesystem::path& path_;
   int fd_;
-  std::size_t size_ = 0;
+  std::uint64_t size_ = 0;
 };
 
 std::uint32_t BigEndian(const unsigned char* bytes, std::size_t offset, std::size_t width) {
@@ -113,9 +116,9 @@ std::uint32_t BigEndian(const unsigned char* bytes, std::size_t offset, std::siz
 void CheckFileHeader(const OpenedFile& file, const std::filesystem::path& path) {
   static constexpr char kMagic[] = "SQLite format 3";  // 16 bytes with the terminating zero
   std::array<unsigned char, 100> header{};
-  const std::size_t size = file.Size();
+  const std::uint64_t size = file.Size();
   if (size == 0) Refuse(Reason::NotADrawing, path, "the file is empty");
-  file.ReadStart(header.data(), std::min(size, header.size()));
+  file.ReadStart(header.data(), static_cast<std::size_t>(std::min<std::uint64_t>(size, header.size())));
   if (size < sizeof kMagic || std::memcmp(header.data(), kMagic, sizeof kMagic) != 0) {
     Refuse(Reason::NotADrawing, path, "");
   }
@@ -133,12 +136,12 @@ void CheckFileHeader(const OpenedFile& file, const std::filesystem::path& path) 
   // Drawing files never use a write-ahead log and always store UTF-8; read as it stands, a
   // header saying otherwise would make SQLite look for side files or convert the texts.
   const std::uint32_t pageSizeField = BigEndian(header.data(), 16, 2);
-  const std::size_t pageSize = pageSizeField == 1 ? 65536 : pageSizeField;
+  const std::uint64_t pageSize = pageSizeField == 1 ? 65536 : pageSizeField;
   if (header[18] != 1 || header[19] != 1 || BigEndian(header.data(), 56, 4) != 1 || pageSize < 512 ||
       (pageSize & (pageSize - 1)) != 0) {
     Refuse(Reason::Damaged, path, "its header is damaged");
   }
-  const std::size_t expectedSize = pageSize * BigEndian(header.data(), 28, 4);
+  const std::uint64_t expectedSize = pageSize * BigEndian(header.data(), 28, 4);
   if (size < expectedSize) {
     Refuse(Reason::Damaged, path,
            "it is cut off after " + std::to_string(size) + " of " + std::to_string(expectedSize) + " bytes");
@@ -179,7 +182,8 @@ Drawing OpenDrawingFile(const std::filesystem::path& path) {
   const OpenedFile file(path);
   CheckFileHeader(file, path);
   const std::unique_ptr<unsigned char[]> bytes = file.ReadAll();
-  const std::span<const unsigned char> content(bytes.get(), file.Size());
+  const auto length = static_cast<std::size_t>(file.Size());  // it is in memory, so it fits
+  const std::span<const unsigned char> content(bytes.get(), length);
   try {
     // SQLite checks the pages on one connection while the rows are read on another, on a second
     // core: the check costs a fifth of opening a large drawing.
@@ -191,7 +195,7 @@ Drawing OpenDrawingFile(const std::filesystem::path& path) {
     std::optional<Drawing> drawing;
     std::exception_ptr rowError;
     try {
-      drawing = drawing_file::ReadDrawingDatabase(rows, file.Size());
+      drawing = drawing_file::ReadDrawingDatabase(rows, length);
     } catch (const std::runtime_error&) {
       rowError = std::current_exception();
     }

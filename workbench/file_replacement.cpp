@@ -1,8 +1,6 @@
-// Temporary files are named ".<name>.<16 hex digits><suffix>" and locked with flock while their
-// write runs. The kernel drops the lock when the process dies, which is how a later write tells
-// the leftovers of a killed one from a write still running in another process. Where a long
-// name leaves no room for the rest, the name is cut: temporaries and backups must fit in a file
-// name wherever their target does.
+// On POSIX systems temporary files are locked with flock while their write runs. The kernel
+// drops the lock when the process dies, which is how a later write tells the leftovers of a
+// killed one from a write still running in another process.
 #include "workbench/file_replacement.h"
 
 #include <fcntl.h>
@@ -11,82 +9,17 @@
 #include <unistd.h>
 
 #include <cerrno>
-#include <cstdint>
-#include <cstdio>
-#include <random>
 #include <string>
 #include <system_error>
+
+#include "workbench/file_replacement_names.h"
 
 namespace wb {
 namespace {
 
-constexpr std::size_t kRandomDigits = 16;
 constexpr int kCreateAttempts = 8;
-constexpr std::string_view kBackupSuffix = ".bak";
 
 [[noreturn]] void ThrowErrno(const char* doing) { throw std::system_error(errno, std::generic_category(), doing); }
-
-// The longest file name the folder's file system takes.
-std::size_t NameLimit(const std::filesystem::path& folder) {
-  constexpr long kUsual = 255;
-  const long limit = pathconf(folder.c_str(), _PC_NAME_MAX);
-  return static_cast<std::size_t>(limit > 0 ? limit : kUsual);
-}
-
-// At most `bytes` bytes of the name, cut between characters, never inside one.
-std::string CutTo(std::string name, std::size_t bytes) {
-  if (name.size() <= bytes) return name;
-  while (bytes > 0 && (static_cast<unsigned char>(name[bytes]) & 0xC0) == 0x80) --bytes;
-  name.resize(bytes);
-  return name;
-}
-
-std::string TemporaryPrefix(const std::filesystem::path& target, std::string_view suffix) {
-  const std::size_t room = NameLimit(target.parent_path()) - 2 - kRandomDigits - suffix.size();
-  return '.' + CutTo(target.filename().string(), room) + '.';
-}
-
-// ".<name>.<16 hex digits><suffix>"
-bool IsTemporary(std::string_view name, std::string_view suffix) {
-  if (name.size() < 2 + kRandomDigits + suffix.size() || !name.starts_with('.') || !name.ends_with(suffix)) {
-    return false;
-  }
-  name.remove_suffix(suffix.size());
-  const std::string_view digits = name.substr(name.size() - kRandomDigits);
-  return digits.find_first_not_of("0123456789abcdef") == std::string_view::npos &&
-         name[name.size() - kRandomDigits - 1] == '.';
-}
-
-// A temporary of the target whose temporaries start with the prefix.
-bool IsTemporaryOf(std::string_view name, std::string_view suffix, std::string_view prefix) {
-  return name.size() == prefix.size() + kRandomDigits + suffix.size() && name.starts_with(prefix) &&
-         IsTemporary(name, suffix);
-}
-
-std::string RandomDigits() {
-  std::random_device random;
-  const std::uint64_t value = (std::uint64_t{random()} << 32) ^ random();
-  char digits[kRandomDigits + 1];
-  std::snprintf(digits, sizeof digits, "%016llx", static_cast<unsigned long long>(value));
-  return digits;
-}
-
-void RemoveIfStale(const std::filesystem::path& path) {
-  const int fd = open(path.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC);
-  if (fd < 0) return;
-  struct stat status {};
-  if (fstat(fd, &status) == 0 && S_ISREG(status.st_mode) && flock(fd, LOCK_EX | LOCK_NB) == 0) unlink(path.c_str());
-  close(fd);
-}
-
-// The temporaries the test picks out, when no running write holds them.
-template <typename Pick>
-void RemoveStale(const std::filesystem::path& folder, Pick pick) {
-  std::error_code error;
-  for (std::filesystem::directory_iterator entry(folder, error), end; !error && entry != end; entry.increment(error)) {
-    if (pick(entry->path().filename().string())) RemoveIfStale(entry->path());
-  }
-}
 
 bool SameFile(int fd, const std::filesystem::path& path) {
   struct stat opened {};
@@ -106,22 +39,29 @@ void SyncFolder(const std::filesystem::path& folder) {
 
 }  // namespace
 
-std::filesystem::path BackupPath(const std::filesystem::path& target) {
-  const std::size_t room = NameLimit(target.parent_path()) - kBackupSuffix.size();
-  return target.parent_path() / (CutTo(target.filename().string(), room) + std::string(kBackupSuffix));
+namespace replacement {
+
+std::size_t NameLimit(const std::filesystem::path& folder) {
+  constexpr long kUsual = 255;
+  const long limit = pathconf(folder.c_str(), _PC_NAME_MAX);
+  return static_cast<std::size_t>(limit > 0 ? limit : kUsual);
 }
 
-void RemoveStaleTemporaries(const std::filesystem::path& folder, std::string_view suffix) {
-  RemoveStale(folder, [suffix](std::string_view name) { return IsTemporary(name, suffix); });
+void RemoveIfStale(const std::filesystem::path& path) {
+  const int fd = open(path.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC);
+  if (fd < 0) return;
+  struct stat status {};
+  if (fstat(fd, &status) == 0 && S_ISREG(status.st_mode) && flock(fd, LOCK_EX | LOCK_NB) == 0) unlink(path.c_str());
+  close(fd);
 }
+
+}  // namespace replacement
 
 FileReplacement::FileReplacement(const std::filesystem::path& target, ReplacementStyle style)
     : target_(std::filesystem::absolute(target)), keepBackup_(style.keepBackup) {
-  const std::filesystem::path folder = target_.parent_path();
-  const std::string prefix = TemporaryPrefix(target_, style.suffix);
-  RemoveStale(folder, [&](std::string_view name) { return IsTemporaryOf(name, style.suffix, prefix); });
+  const replacement::TemporaryNames names(target_, style.suffix);
   for (int attempt = 1; lock_ < 0; ++attempt) {
-    temporary_ = folder / (prefix + RandomDigits() + std::string(style.suffix));
+    temporary_ = names.Next();
     const int fd = open(temporary_.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
     if (fd < 0 && (errno != EEXIST || attempt == kCreateAttempts)) ThrowErrno("creating a temporary file");
     if (fd < 0) continue;

@@ -42,7 +42,11 @@ class FileReplacement {
   std::filesystem::path target_;
   std::filesystem::path temporary_;
   bool keepBackup_ = false;
-  int lock_ = -1;
+#if defined(_WIN32)
+  void* file_ = nullptr;  // the temporary's handle, held open without sharing while it is written
+#else
+  int lock_ = -1;  // the temporary's descriptor, locked
+#endif
   bool committed_ = false;
 };
 

@@ -1,5 +1,5 @@
 // Host calls of 2D generation: long names, file locks, special folders, configuration symbols,
-// the category walk, selection and the design-mode frame test.
+// the category walk and selection.
 #include <algorithm>
 #include <cstdio>
 #include <cstring>
@@ -7,7 +7,6 @@
 #include <system_error>
 #include <unistd.h>
 
-#include "shell/host/dsgmode.h"
 #include "shell/host/qeldll_2d.h"
 #include "workbench/draft/file_lock.h"
 #include "workbench/host_call_support.h"
@@ -129,10 +128,4 @@ host::Status select_app_entity(host::DatabaseHandle database, host::EntityHandle
   if (std::find(selection.begin(), selection.end(), entity) == selection.end()) selection.push_back(entity);
   call::JournalHostCall("select_app_entity", entity);
   return host::kOk;
-}
-
-std::int16_t IsDsgFrameEntity(host::DatabaseHandle database, host::EntityHandle entity) {
-  if (auto fault = Fault("IsDsgFrameEntity", entity)) return static_cast<std::int16_t>(*fault);
-  const Entity* found = call::FindEntity(database, entity);
-  return found != nullptr && found->FindAttribute("@dsgframe=") != nullptr ? 1 : 0;
 }

@@ -1,7 +1,12 @@
 // Slab allocator behind the host's texts and lists, with release checks that never crash.
 #include "workbench/host_memory.h"
 
+#if __has_include(<sanitizer/asan_interface.h>)
 #include <sanitizer/asan_interface.h>
+#else  // a toolchain without sanitizers (MinGW): the poisoning marks are no-ops there too
+#define ASAN_POISON_MEMORY_REGION(address, size) ((void)(address), (void)(size))
+#define ASAN_UNPOISON_MEMORY_REGION(address, size) ((void)(address), (void)(size))
+#endif
 
 #include <algorithm>
 #include <cstdlib>

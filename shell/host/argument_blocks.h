@@ -4,6 +4,7 @@
 
 #include <cstdint>
 
+#include "shell/host/host_api.h"
 #include "shell/host/host_types.h"
 
 namespace host {
@@ -20,8 +21,12 @@ struct DbBlock {
 
 }  // namespace host
 
-extern std::int32_t globi[host::kGlobiSize];
-extern float globr[host::kGlobrSize];
-extern host::Point3f globp[host::kGlobpSize];
-extern char globc[host::kGlobcSize];
-extern host::DbBlock db;
+extern "C" {
+
+extern QELDLL_DATA std::int32_t globi[host::kGlobiSize];
+extern QELDLL_DATA float globr[host::kGlobrSize];
+extern QELDLL_DATA host::Point3f globp[host::kGlobpSize];
+extern QELDLL_DATA char globc[host::kGlobcSize];
+extern QELDLL_DATA host::DbBlock db;
+
+}  // extern "C"

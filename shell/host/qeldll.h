@@ -13,6 +13,8 @@ using host::EntityHandle;
 using host::RecordHandle;
 using host::Status;
 
+extern "C" {
+
 // --- Entities --------------------------------------------------------------------------
 Status qel_read_entity_header(DatabaseHandle database, EntityHandle entity, host::EntityHeader* header);
 Status qel_update_entity_header(DatabaseHandle database, EntityHandle entity, const host::EntityHeader* header);
@@ -120,3 +122,5 @@ void g32d(const float points[9], float matrix[16], std::int32_t* status);
 float distance_3d(const host::Point3f* a, const host::Point3f* b);
 // Answers 1 when the text holds double-byte characters.
 std::int16_t iskanji_string(const char* text);
+
+}  // extern "C"

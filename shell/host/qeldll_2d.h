@@ -10,6 +10,8 @@ namespace host {
 constexpr int kLockTextSize = 100;  // each of Session_CheckLockEx's two text buffers
 }
 
+extern "C" {
+
 // The full path of the current drawing file (host-owned).
 const char* db_title_file_name();
 
@@ -36,3 +38,5 @@ void SetSymbolString(const char* name, const char* value);
 void dbloop(host::DatabaseHandle database, host::EntityHandle* entity, std::uint8_t bytes[4], std::int16_t* end);
 // Adds the entity to the host's selection.
 host::Status select_app_entity(host::DatabaseHandle database, host::EntityHandle entity);
+
+}  // extern "C"

@@ -22,6 +22,8 @@ using LayerTableHandle = std::int32_t;
 
 }  // namespace host
 
+extern "C" {
+
 // Wait cursor: every add is matched by a remove.
 void add_wait_cur();
 void remove_wait_cur();
@@ -51,3 +53,5 @@ host::Status HDL_Set_Layer_On(host::LayerTableHandle table, std::int32_t layer);
 host::Status HDL_Set_Layer_Off(host::LayerTableHandle table, std::int32_t layer);
 // The layer's name (host-owned, valid until the next layer call); null for a bad index.
 const char* HDL_Get_LayerName(host::LayerTableHandle table, std::int32_t layer);
+
+}  // extern "C"

@@ -101,6 +101,16 @@ TEST_F(DrawingFileRefusal, OtherVersionsCutOffAndDamagedFiles) {
   ExpectDamaged([](Bytes& b) { b.pop_back(); }, "it is cut off");
   ExpectDamaged([](Bytes& b) { b.resize(60); }, "(it is cut off in its header)");
   ExpectDamaged([](Bytes& b) { b.insert(b.end(), 4096, 0); }, "(its size does not match its header)");
+  // The expected size is reckoned in 64 bits: a page count 4 GiB too large must not wrap round
+  // to the real size on a 32-bit build.
+  ExpectDamaged(
+      [](Bytes& b) {
+        const std::uint32_t pageSize = b[16] << 8 | b[17];
+        const std::uint32_t pages = (b[28] << 24 | b[29] << 16 | b[30] << 8 | b[31]) + (1U << 31) / pageSize * 2;
+        for (int i = 0; i < 4; ++i) b[28 + i] = static_cast<std::uint8_t>(pages >> (24 - 8 * i));
+      },
+      "(it is cut off after " + std::to_string(size) + " of " + std::to_string(size + (std::uint64_t{1} << 32)) +
+          " bytes)");
   ExpectDamaged([](Bytes& b) { b[18] = b[19] = 2; }, "its header is damaged");
   ExpectDamaged([](Bytes& b) { b[59] = 2; }, "its header is damaged");
   ExpectDamaged([](Bytes& b) { b[16] = 0x30; }, "its header is damaged");

@@ -62,14 +62,15 @@ TEST(DrawingFileCrashSafety, AKilledSaveLeavesTheOldOrTheNewDrawing) {
   ASSERT_EQ(wb::OpenDrawingFile(file), drawings[0]);
 
   std::mt19937 random(20240611);
-  const long longest = std::chrono::duration_cast<std::chrono::microseconds>(saveTime * 5 / 4).count();
-  std::uniform_int_distribution<long> delay(0, longest);
+  using Microseconds = std::chrono::microseconds;
+  const Microseconds::rep longest = std::chrono::duration_cast<Microseconds>(saveTime * 5 / 4).count();
+  std::uniform_int_distribution<Microseconds::rep> delay(0, longest);
   std::size_t current = 0;
   std::array<int, 2> outcomes{};  // old drawing kept, new one written
   for (int trial = 0; trial < 220; ++trial) {
     SCOPED_TRACE(testing::Message() << "trial " << trial);
     const std::size_t next = 1 - current;
-    const int status = SaveInChild(drawings[next], file, std::chrono::microseconds(delay(random)));
+    const int status = SaveInChild(drawings[next], file, Microseconds(delay(random)));
     ASSERT_TRUE(!WIFEXITED(status) || WEXITSTATUS(status) == 0) << "the save failed";
     wb::Drawing opened;
     ASSERT_NO_THROW(opened = wb::OpenDrawingFile(file));

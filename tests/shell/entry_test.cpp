@@ -1,5 +1,6 @@
 // Dispatch of the library entry: which sub-commands create the pane and what each starts.
 #include <limits>
+#include <new>
 #include <string>
 #include <vector>
 
@@ -170,6 +171,17 @@ TEST_F(EntryTest, AFailedAllocationStopsAndIsRetriedLater) {
   EXPECT_EQ(pandex::GetPane(), nullptr);
   EXPECT_TRUE(log.empty());
   refuseAllocation = false;
+  Run(1);
+  EXPECT_EQ(log, (std::vector<std::string>{"Create 5000 without parent", "Show"}));
+}
+
+TEST_F(EntryTest, NothingThrownInsideReachesTheHost) {
+  pandex::SetPaneFactory([this]() -> std::unique_ptr<CPandexDlg> {
+    if (++panesMade == 1) throw std::bad_alloc();
+    return std::make_unique<RecordingPane>(log);
+  });
+  EXPECT_NO_THROW(Run(1));
+  EXPECT_EQ(pandex::GetPane(), nullptr);
   Run(1);
   EXPECT_EQ(log, (std::vector<std::string>{"Create 5000 without parent", "Show"}));
 }
